@@ -1,6 +1,6 @@
 #include "contract/Diagnostics.h"
 
-#include <thrift/TOutput.h>
+#include <thrift/Thrift.h>
 
 namespace hsdig::diagnostics {
 
