@@ -125,21 +125,37 @@ std::string renderJson1(Translator& translator, int32_t code, const rapidjson::V
   if (description == nullptr || !description->IsObject()) return trimLineBreaks(std::move(text));
 
   bool debug = request.debug || asksForDebug(*description);
-  std::string dynamicJson = translator.getDynamicDesc(toJson(*description), request.language,
-                                                      request.ade, request.format);
-  text += "\n\n";
-  text += formatDynamicItems(dynamicJson, debug);
+  try {
+    std::string dynamicJson = translator.getDynamicDesc(toJson(*description), request.language,
+                                                        request.ade, request.format);
+    text += "\n\n";
+    text += formatDynamicItems(dynamicJson, debug);
+  } catch (TranslationFailure& failure) {
+    // The static description stands even when the details cannot be shown.
+    if (!failure.partialText().empty()) throw;
+    TranslationFailure withText(failure.code(), failure.what(), trimLineBreaks(text));
+    withText.status() = failure.status();
+    throw withText;
+  }
   text = trimLineBreaks(std::move(text));
 
   auto nested = description->FindMember("nested_error");
   if (nested != description->MemberEnd()) {
-    if (!nested->value.IsArray()) fail(kNestedNotArray);
+    if (!nested->value.IsArray()) throw TranslationFailure(kCodeInternal, kNestedNotArray, text);
     for (const auto& element : nested->value.GetArray()) {
-      if (!element.IsObject()) fail(kNestedElementInvalid);
+      if (!element.IsObject() || !element.HasMember("code") || !element["code"].IsInt()) {
+        throw TranslationFailure(kCodeInternal, kNestedElementInvalid, text);
+      }
       auto nestedCode = element.FindMember("code");
-      if (nestedCode == element.MemberEnd() || !nestedCode->value.IsInt())
-        fail(kNestedElementInvalid);
-      std::string block = renderJson1(translator, nestedCode->value.GetInt(), &element, request);
+      std::string block;
+      try {
+        block = renderJson1(translator, nestedCode->value.GetInt(), &element, request);
+      } catch (TranslationFailure& failure) {
+        // What was rendered of the outer error stands.
+        TranslationFailure withText(failure.code(), failure.what(), text);
+        withText.status() = failure.status();
+        throw withText;
+      }
       text += "\n\n";
       text += indent(block);
     }

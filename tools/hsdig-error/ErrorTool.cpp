@@ -1,5 +1,6 @@
 #include "tools/hsdig-error/ErrorTool.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cinttypes>
 #include <cstdio>
@@ -136,10 +137,16 @@ int runErrorTool(const std::vector<std::string>& args, std::ostream& out, std::o
 
   translator::TranslatorSession session(options);
   if (list) {
+    // Listed as callers see the codes: mapped, in order of their unsigned value.
+    std::vector<std::pair<uint32_t, std::string>> rows;
     for (const auto& [original, text] : session.listStaticDescriptions(language)) {
-      int32_t reported = translator::cvmxl_mapErrorCode(original);
-      std::string firstLine = text.substr(0, text.find('\n'));
-      out << hex(reported) << "  " << reported << "  " << firstLine << "\n";
+      rows.emplace_back(static_cast<uint32_t>(translator::cvmxl_mapErrorCode(original)),
+                        text.substr(0, text.find('\n')));
+    }
+    std::sort(rows.begin(), rows.end());
+    for (const auto& [reported, firstLine] : rows) {
+      auto code = static_cast<int32_t>(reported);
+      out << hex(code) << "  " << code << "  " << firstLine << "\n";
     }
     return kExitOk;
   }

@@ -1,0 +1,257 @@
+// The term tables: module form, key parity of every language with English,
+// no English left in a translation except names, and coverage of the codes
+// and keys this system raises.
+#include <gtest/gtest.h>
+
+#include <lua.hpp>
+
+#include <algorithm>
+#include <map>
+#include <regex>
+#include <set>
+#include <string>
+#include <vector>
+
+#include "errors/translator/EmbeddedModules.h"
+#include "errors/translator/Translator.h"
+#include "errors/translator/TranslatorSession.h"
+
+namespace hsdig::translator {
+namespace {
+
+constexpr int32_t ivi(uint32_t code) {
+  return static_cast<int32_t>(code);
+}
+
+// Table families with a language suffix, and whether their texts are names
+// (names need not differ from English).
+struct Family {
+  const char* prefix;
+  bool names;
+};
+const Family kFamilies[] = {
+    {"errors_", false}, {"commonTerms_", false}, {"hsdig_attributes_", true}};
+
+// Keys whose English text is itself a name or identifier, the same in every
+// language.
+const std::set<std::string> kUntranslatedKeys = {"rest_of_input_json"};
+
+// Loads module `name` into `L` and returns its entries as key text -> text
+// (for attribute tables: the short name and every value name).
+std::map<std::string, std::string> entriesOf(lua_State* L, const std::string& name) {
+  std::map<std::string, std::string> out;
+  int top = lua_gettop(L);
+  lua_getglobal(L, "require");
+  lua_pushstring(L, name.c_str());
+  if (lua_pcall(L, 1, 1, 0) != 0) {
+    ADD_FAILURE() << name << ": " << lua_tostring(L, -1);
+    lua_settop(L, top);
+    return out;
+  }
+  lua_getfield(L, -1, "encoding");
+  EXPECT_STREQ(lua_tostring(L, -1), "utf-8") << name;
+  lua_pop(L, 1);
+  lua_getfield(L, -1, "entries");
+  if (!lua_istable(L, -1)) {
+    ADD_FAILURE() << name << " has no entries";
+    lua_settop(L, top);
+    return out;
+  }
+  lua_pushnil(L);
+  while (lua_next(L, -2) != 0) {
+    lua_pushvalue(L, -2);
+    std::string key = lua_tostring(L, -1);
+    lua_pop(L, 1);
+    if (lua_isstring(L, -1)) {
+      out[key] = lua_tostring(L, -1);
+    } else if (lua_istable(L, -1)) {
+      lua_getfield(L, -1, "name");
+      out[key] = lua_isstring(L, -1) ? lua_tostring(L, -1) : "";
+      lua_pop(L, 1);
+      lua_getfield(L, -1, "values");
+      if (lua_istable(L, -1)) {
+        lua_pushnil(L);
+        while (lua_next(L, -2) != 0) {
+          lua_pushvalue(L, -2);
+          out[key + " value " + lua_tostring(L, -1)] =
+              lua_isstring(L, -2) ? lua_tostring(L, -2) : "";
+          lua_pop(L, 2);
+        }
+      }
+      lua_pop(L, 1);
+    }
+    lua_pop(L, 1);
+  }
+  lua_settop(L, top);
+  return out;
+}
+
+// The key-parity check of one language table against English; answers one
+// message per missing or extra key.
+std::vector<std::string> parityProblems(lua_State* L, const std::string& english,
+                                        const std::string& other) {
+  auto reference = entriesOf(L, english);
+  auto translated = entriesOf(L, other);
+  std::vector<std::string> problems;
+  for (const auto& [key, text] : reference) {
+    if (!translated.count(key)) problems.push_back(other + " lacks the key " + key);
+  }
+  for (const auto& [key, text] : translated) {
+    if (!reference.count(key))
+      problems.push_back(other + " has the key " + key + ", which " + english + " lacks");
+  }
+  return problems;
+}
+
+std::vector<std::string> languageModules(const char* prefix) {
+  std::vector<std::string> out;
+  std::regex pattern(std::string("^") + prefix + "([a-z]{3})$");
+  for (std::size_t i = 0; i < kEmbeddedModuleCount; ++i) {
+    std::smatch match;
+    std::string name = kEmbeddedModules[i].name;
+    if (std::regex_match(name, match, pattern) && match[1] != "eng") out.push_back(name);
+  }
+  return out;
+}
+
+class TermTables : public testing::Test {
+ protected:
+  Translator translator{kTranslatorSettings, "/nonexistent"};
+  lua_State* L = translator.state();
+};
+
+TEST_F(TermTables, EveryLanguageTableHasExactlyTheEnglishKeys) {
+  for (const auto& family : kFamilies) {
+    std::string english = std::string(family.prefix) + "eng";
+    SCOPED_TRACE(english);
+    EXPECT_FALSE(entriesOf(L, english).empty() &&
+                 std::string(family.prefix) != "hsdig_attributes_");
+    for (const auto& other : languageModules(family.prefix)) {
+      SCOPED_TRACE(other);
+      for (const auto& problem : parityProblems(L, english, other)) ADD_FAILURE() << problem;
+    }
+  }
+}
+
+TEST_F(TermTables, TheParityCheckNamesAMissingKey) {
+  // A stand-in translation that lacks one key and adds another.
+  ASSERT_EQ(luaL_dostring(L, R"(
+      local english = require("commonTerms_eng").entries
+      local copy = {}
+      for k, v in pairs(english) do copy[k] = "x" .. v end
+      copy.kSidlNoTag = nil
+      copy.kSurplus = "y"
+      package.preload["commonTerms_tst"] = function()
+        return require("cvmxl_utilities").stringTable(copy)
+      end)"),
+            0);
+  auto problems = parityProblems(L, "commonTerms_eng", "commonTerms_tst");
+  ASSERT_EQ(problems.size(), 2u);
+  EXPECT_EQ(problems[0], "commonTerms_tst lacks the key kSidlNoTag");
+  EXPECT_EQ(problems[1], "commonTerms_tst has the key kSurplus, which commonTerms_eng lacks");
+}
+
+TEST_F(TermTables, NoTextIsLeftInEnglishInAnotherLanguageExceptNames) {
+  int checked = 0;
+  for (const auto& family : kFamilies) {
+    if (family.names) continue;
+    std::string english = std::string(family.prefix) + "eng";
+    auto reference = entriesOf(L, english);
+    for (const auto& other : languageModules(family.prefix)) {
+      SCOPED_TRACE(other);
+      for (const auto& [key, text] : entriesOf(L, other)) {
+        if (kUntranslatedKeys.count(key) || !reference.count(key)) continue;
+        EXPECT_NE(text, reference[key]) << other << " keeps the English text of " << key;
+        ++checked;
+      }
+    }
+  }
+  if (checked == 0) GTEST_SKIP() << "no translated tables are embedded yet";
+}
+
+TEST_F(TermTables, EnglishCoversEveryCodeAndKeyThisSystemRaises) {
+  const int32_t codes[] = {
+      ivi(0xBFFA0000), ivi(0xBFFA0009), ivi(0xBFFA000F), ivi(0xBFFA0010), ivi(0xBFFA0013),
+      ivi(0xBFFA004A), ivi(0xBFFA004C), ivi(0xBFFA0056), ivi(0xBFFA0058), ivi(0xBFFA0060),
+      ivi(0xBFFA1190), ivi(0xBFFA402B), ivi(0xBFFA402E), ivi(0xBFFA40BA), ivi(0xBFFA8BF0),
+      ivi(0xBFFA8CF0), ivi(0xBFFA9175), ivi(0xBFFA9178), ivi(0xBFFA9181), ivi(0xBFFA9182),
+      ivi(0xBFFF0011), ivi(0xBFFF003C), ivi(0xBFFF0078), ivi(0xBFFF0000), ivi(0xBFFA9400),
+      ivi(0xBFFA9403), ivi(0xBFFA9405), ivi(0xBFFA9406), ivi(0xBFFA9408), ivi(0xBFFA941B),
+      ivi(0xBFFA941D), -52000,          -52003,          -52005,          -52006,
+      -52008,          -52027,          -52029,
+  };
+  TranslatorSession session;
+  for (int32_t code : codes) {
+    SCOPED_TRACE(testing::Message() << std::hex << static_cast<uint32_t>(code));
+    bool known = false;
+    session.staticDescription(code, 0, &known);
+    EXPECT_TRUE(known);
+  }
+  for (uint32_t code = 0xBFFA914E; code <= 0xBFFA915C; ++code) {
+    SCOPED_TRACE(testing::Message() << std::hex << code);
+    bool known = false;
+    session.staticDescription(ivi(code), 0, &known);
+    EXPECT_TRUE(known);
+  }
+
+  auto terms = entriesOf(L, "commonTerms_eng");
+  const char* keys[] = {
+      "kUsageTypeAffectedAttribute",
+      "kUsageTypeAttributeId",
+      "kUsageTypeAttributeIdentifier",
+      "kUsageTypeConflictingAttr",
+      "kUsageTypeConflictingProperty",
+      "kUsageTypeDevice",
+      "kUsageTypeFilePath",
+      "kUsageTypeInvalidIdentifier",
+      "kUsageTypeParameterName",
+      "kUsageTypeRequestedDeviceName",
+      "kUsageTypeRequestedValue",
+      "kUsageTypeUnspecifiedProperty",
+      "kSidlUsageTypeErrno",
+      "kSidlSetupContainsEqual",
+      "kSidlSetupNotParsed",
+      "kSidlInvalidTag",
+      "kSidlRepeatedTag",
+      "kSidlNotInteger",
+      "kSidlNotBoolean",
+      "kSidlNoTag",
+      "kSidlNoValue",
+      "kSidlInvalidLanguage",
+      "kSidlInvalidResourceName",
+      "kSidlRepeatedResourceName",
+      "kSidlNoResourceName",
+      "kSidlInvalidFileHandle",
+      "kSidlInitialization",
+      "kSidlMaxNumSessionsExceeded",
+      "kSidlSharedMemMutex",
+      "Oversized session information table data section",
+      "You must set the CloseFunctionPtr prior to calling any functions.",
+      "Windows generated an error",
+      "Windows Error Code:",
+      "Windows Error Message:",
+      "Component",
+      "File",
+      "Line",
+      "Internal Error",
+  };
+  for (const char* key : keys) {
+    SCOPED_TRACE(key);
+    EXPECT_TRUE(terms.count(key));
+  }
+  // The DriverSetup messages are fixed texts.
+  EXPECT_EQ(terms["kSidlSetupContainsEqual"], "DriverSetup string cannot contain a '='");
+  EXPECT_EQ(terms["kSidlInvalidFileHandle"], "Invalid file handle.");
+}
+
+TEST_F(TermTables, EnglishTextsAreCompleteSentences) {
+  for (const auto& [key, text] : entriesOf(L, "errors_eng")) {
+    SCOPED_TRACE(key);
+    ASSERT_FALSE(text.empty());
+    EXPECT_TRUE(std::isupper(static_cast<unsigned char>(text.front())));
+    EXPECT_EQ(text.back(), '.');
+  }
+}
+
+}  // namespace
+}  // namespace hsdig::translator
