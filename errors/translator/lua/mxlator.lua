@@ -115,6 +115,19 @@ local function chooseAttributeTable(lc, env, notes)
   return nil
 end
 
+-- Descriptions are read by the fast reader, unless they hold an integer
+-- literal too long for a double to keep exact: then by the script reader,
+-- which keeps 64-bit integers exact. Both refuse nesting beyond 200 levels.
+cjson.decode_max_depth(200)
+local function decode(text)
+  if string.find(text, "%d%d%d%d%d%d%d%d%d%d%d%d%d%d%d%d") then return json.decode(text) end
+  return cjson.decode(text)
+end
+
+local function isNull(v)
+  return v == nil or v == json.null or v == cjson.null
+end
+
 local function numberText(v)
   if stdint.isinteger(v) then return tostring(v) end
   if v == math.floor(v) and math.abs(v) < 2 ^ 63 then return string.format("%d", v) end
@@ -126,7 +139,7 @@ local function scalarText(v)
   if kind == "string" then return v end
   if kind == "number" or stdint.isinteger(v) then return numberText(v) end
   if kind == "boolean" then return tostring(v) end
-  if v == json.null or v == nil then return "" end
+  if isNull(v) then return "" end
   return json.encode(v)
 end
 
@@ -157,7 +170,7 @@ end
 
 -- Applies `show` to a scalar or to each element of an array.
 local function mapValue(value, show)
-  if type(value) == "table" and value ~= json.null and not stdint.isinteger(value) then
+  if type(value) == "table" and not isNull(value) and not stdint.isinteger(value) then
     local out = {}
     for i = 1, #value do out[i] = show(value[i]) end
     if #out == 0 then return "" end
@@ -189,7 +202,7 @@ function M.getDynamicDesc(errjson, lang, ade, format)
   if format ~= "json1" then
     return nil, -52029, "unsupported description format: " .. tostring(format)
   end
-  local doc = json.decode(errjson)
+  local doc = decode(errjson)
   if type(doc) ~= "table" then error("description is not a JSON object", 0) end
   local lc = mu.languageCode(lang)
   local env = environments[tonumber(ade) or 0] or "none"
@@ -216,7 +229,7 @@ function M.getDynamicDesc(errjson, lang, ade, format)
   end
 
   local function addDebug(key, value)
-    if value ~= nil and value ~= json.null then
+    if not isNull(value) then
       debug[#debug + 1] = { type = "usage", key = term(terms, key), value = scalarText(value) }
     end
   end
