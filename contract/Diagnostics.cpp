@@ -6,7 +6,9 @@ namespace hsdig::diagnostics {
 
 void discard(const char*) {}
 
-void installSink(Sink sink) { apache::thrift::GlobalOutput.setOutputFunction(sink); }
+void installSink(Sink sink) {
+  apache::thrift::GlobalOutput.setOutputFunction(sink);
+}
 
 namespace {
 // Runs when the shared object is loaded (the object file is linked whole);

@@ -57,7 +57,8 @@ void pushUsage(Status& status, std::string_view usage, Value value, const char* 
 void prepare(Status& status, bool isDebug) {
   auto& doc = objectOf(status);
   auto& alloc = doc.GetAllocator();
-  if (!doc.HasMember("translator")) doc.AddMember("translator", Value(kTranslatorName, alloc), alloc);
+  if (!doc.HasMember("translator"))
+    doc.AddMember("translator", Value(kTranslatorName, alloc), alloc);
   Value& info = member(doc, "translator_info", rapidjson::kObjectType, alloc);
   if (!info.HasMember("version")) info.AddMember("version", kTranslatorInfoVersion, alloc);
   if (!info.HasMember("is_debug")) info.AddMember("is_debug", isDebug, alloc);

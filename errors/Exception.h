@@ -26,7 +26,8 @@ class ExceptionBase : public std::exception {
 class Exception : public ExceptionBase {
  public:
   // A failure with `code`, thrown at `where`.
-  explicit Exception(int32_t code, const std::source_location& where = std::source_location::current());
+  explicit Exception(int32_t code,
+                     const std::source_location& where = std::source_location::current());
   // A failure carrying a copy of `status` (code and description). The throw
   // site is recorded unless the status already holds a source location.
   explicit Exception(const Status& status,
@@ -61,7 +62,8 @@ class HostErrorException : public std::exception {
 };
 
 // Throws Exception(code) at the caller's site when `code` is negative.
-inline void throwIfError(int32_t code, const std::source_location& where = std::source_location::current()) {
+inline void throwIfError(int32_t code,
+                         const std::source_location& where = std::source_location::current()) {
   if (code < 0) throw Exception(code, where);
 }
 

@@ -28,7 +28,9 @@ void setMember(rapidjson::Document& doc, const char* key, rapidjson::Value value
 
 }  // namespace
 
-Status::Status(int32_t code, const std::source_location& where) { set(code, where); }
+Status::Status(int32_t code, const std::source_location& where) {
+  set(code, where);
+}
 
 Status::Status(const Status& other) : code_(other.code_) {
   description_.CopyFrom(other.description_, description_.GetAllocator());

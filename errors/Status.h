@@ -29,7 +29,8 @@ class Status {
  public:
   Status() = default;
   // A Status holding `code`, set from `where`.
-  explicit Status(int32_t code, const std::source_location& where = std::source_location::current());
+  explicit Status(int32_t code,
+                  const std::source_location& where = std::source_location::current());
 
   Status(const Status& other);
   Status& operator=(const Status& other);

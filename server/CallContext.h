@@ -13,7 +13,7 @@ namespace hsdig {
 
 struct CallContext {
   enum State : int32_t {
-    kIdle = 100,          // nothing half done
+    kIdle = 100,            // nothing half done
     kReadingRequest = 101,  // header and arguments being read
     kWritingReply = 102,    // reply being written
   };

@@ -23,7 +23,10 @@ using test::serialize;
 TEST(Records, RoundTripKeepsValuesAndSetsEveryPresenceFlag) {
   RetStatus status;
   status.code = -1074097790;
-  status.localizedTextDescription = "session \xE2\x80\x9C" "A\x00" "B\xE2\x80\x9D";
+  status.localizedTextDescription =
+      "session \xE2\x80\x9C"
+      "A\x00"
+      "B\xE2\x80\x9D";
 
   {
     SCOPED_TRACE("RetStatus");
@@ -240,8 +243,14 @@ TEST(Records, EmptyListsAreAHeaderWithCountZero) {
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.name);
-    std::string header{static_cast<char>(c.fieldType), 0, static_cast<char>(c.fieldId),
-                       static_cast<char>(c.elementType), 0, 0, 0, 0};
+    std::string header{static_cast<char>(c.fieldType),
+                       0,
+                       static_cast<char>(c.fieldId),
+                       static_cast<char>(c.elementType),
+                       0,
+                       0,
+                       0,
+                       0};
     EXPECT_NE(c.bytes.find(header), std::string::npos);
   }
 }

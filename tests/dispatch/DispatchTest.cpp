@@ -47,8 +47,8 @@ class TestHandler : public hsdigEPNull {
   void configureVertical(RetStatus& ret, const Nulls_hsdig_ConfigureVertical& nulls, int32_t vi,
                          const std::string& channelList, double range, double offset,
                          int32_t coupling, double probeAttenuation, int16_t enabled) override {
-    seenVertical = {nulls.channelList, vi, channelList, range, offset, coupling,
-                    probeAttenuation, enabled};
+    seenVertical = {nulls.channelList, vi,     channelList, range, offset, coupling,
+                    probeAttenuation,  enabled};
     ret.code = 1;
     ret.localizedTextDescription = "coerced";
   }
@@ -312,9 +312,7 @@ TEST_F(Dispatch, FailedReadTellsTheContextBeforeTheRequestIsCountedRead) {
 class BrokenOutput : public apache::thrift::transport::TVirtualTransport<BrokenOutput> {
  public:
   void write(const uint8_t*, uint32_t) {}
-  void flush() override {
-    throw TTransportException(TTransportException::NOT_OPEN, "peer closed");
-  }
+  void flush() override { throw TTransportException(TTransportException::NOT_OPEN, "peer closed"); }
 };
 
 TEST_F(Dispatch, FailedWriteTellsTheContextAndReleasesTheReplyLock) {
@@ -325,9 +323,9 @@ TEST_F(Dispatch, FailedWriteTellsTheContextAndReleasesTheReplyLock) {
   ConcurrentProcessorEventHandler serverContext(guard, connectionLock);
 
   EXPECT_THROW(processor.process(in.protocol, broken, &context, nullptr), TTransportException);
-  EXPECT_EQ(context.events, (std::vector<std::string>{"requestStarting", "requestRead",
-                                                      "replyStarting", "callFailed",
-                                                      "replyFinished"}));
+  EXPECT_EQ(context.events,
+            (std::vector<std::string>{"requestStarting", "requestRead", "replyStarting",
+                                      "callFailed", "replyFinished"}));
 
   MemoryWire again;
   writeRequest(again, "pingServer", apache::thrift::protocol::T_CALL, 1,

@@ -92,8 +92,7 @@ TEST(ErrorDescription, NestedAndInternalErrorsAccumulate) {
   EXPECT_EQ(nested[0]["code"].GetInt(), -52008);
   EXPECT_STREQ(nested[0]["internal_error"][0]["api"].GetString(), "linux");
   EXPECT_EQ(nested[0]["internal_error"][0]["code"].GetInt(), 13);
-  EXPECT_STREQ(nested[0]["translator_info"]["ordered_data"][0]["value"].GetString(),
-               "/dev/shm/x");
+  EXPECT_STREQ(nested[0]["translator_info"]["ordered_data"][0]["value"].GetString(), "/dev/shm/x");
   EXPECT_EQ(nested[1]["code"].GetInt(), 0);
 
   // The nested copy is independent of its source.

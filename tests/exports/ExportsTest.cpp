@@ -28,7 +28,9 @@ std::vector<std::string> exportedSymbols(const char* path) {
   ::close(fd);
   if (map == MAP_FAILED) throw std::runtime_error("cannot map the library");
   const auto* base = static_cast<const unsigned char*>(map);
-  auto within = [&](size_t offset, size_t length) { return offset <= size && length <= size - offset; };
+  auto within = [&](size_t offset, size_t length) {
+    return offset <= size && length <= size - offset;
+  };
 
   std::vector<std::string> names;
   const auto* header = reinterpret_cast<const Elf64_Ehdr*>(base);
