@@ -45,14 +45,16 @@ std::string ansiCodeSet() {
 }
 
 std::string ansiToUtf8(std::string_view text) {
-  if (std::all_of(text.begin(), text.end(), [](char c) { return static_cast<unsigned char>(c) < 128; })) {
+  if (std::all_of(text.begin(), text.end(),
+                  [](char c) { return static_cast<unsigned char>(c) < 128; })) {
     return std::string(text);
   }
   return ansiToUtf8(text, ansiCodeSet());
 }
 
 std::string ansiToUtf8(std::string_view text, const std::string& codeSet) {
-  if (std::all_of(text.begin(), text.end(), [](char c) { return static_cast<unsigned char>(c) < 128; })) {
+  if (std::all_of(text.begin(), text.end(),
+                  [](char c) { return static_cast<unsigned char>(c) < 128; })) {
     return std::string(text);
   }
   try {

@@ -76,7 +76,7 @@ ViStatus IviEngineBinding::load() {
   Functions found;
   std::string missing;
 #define HSDIG_IVI_RESOLVE(cname, method, avail, kind, support, ret, sess, params, args) \
-  found.cname = reinterpret_cast<decltype(found.cname)>(dlsym(handle, #cname));        \
+  found.cname = reinterpret_cast<decltype(found.cname)>(dlsym(handle, #cname));         \
   if (!found.cname && HSDIG_IVI_IS_REQUIRED(avail)) missing += #cname " ";
   IVI_ENGINE_FUNCTIONS(HSDIG_IVI_RESOLVE)
 #undef HSDIG_IVI_RESOLVE
@@ -93,14 +93,14 @@ ViStatus IviEngineBinding::load() {
 }
 
 #define HSDIG_IVI_BINDING_DEFINE(cname, method, avail, kind, support, ret, sess, params, args) \
-  ret IviEngineBinding::cname params {                                                          \
-    if (ViStatus st = load(); st != VI_SUCCESS) {                                               \
-      (void)st;                                                                                 \
-      return IVI_ENGINE_CAT(HSDIG_IVI_LOAD_FAILED_, kind)(                                      \
-          ret, loadFailed(Tag_##cname{}, st, HSDIG_IVI_UNPAREN args));                          \
-    }                                                                                           \
-    if (!functions_.cname) return IVI_ENGINE_CAT(HSDIG_IVI_ABSENT_, kind)(ret);                 \
-    return functions_.cname args;                                                               \
+  ret IviEngineBinding::cname params {                                                         \
+    if (ViStatus st = load(); st != VI_SUCCESS) {                                              \
+      (void)st;                                                                                \
+      return IVI_ENGINE_CAT(HSDIG_IVI_LOAD_FAILED_, kind)(                                     \
+          ret, loadFailed(Tag_##cname{}, st, HSDIG_IVI_UNPAREN args));                         \
+    }                                                                                          \
+    if (!functions_.cname) return IVI_ENGINE_CAT(HSDIG_IVI_ABSENT_, kind)(ret);                \
+    return functions_.cname args;                                                              \
   }
 IVI_ENGINE_FUNCTIONS(HSDIG_IVI_BINDING_DEFINE)
 #undef HSDIG_IVI_BINDING_DEFINE

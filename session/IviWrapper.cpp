@@ -19,16 +19,16 @@ ViStatus IviWrapper::settle(ViStatus status, int noThrow, bool returnsSize,
 
 // For S rows the row's argument list names `vi`: it is this wrapper's
 // session.
-#define HSDIG_IVI_DEFINE_STATUS(cname, method, ret, sess, params, args)                       \
-  ViStatus IviWrapper::method(HSDIG_IVI_WITH_NOTHROW(HSDIG_IVI_OP_PARAMS(sess, params))) {     \
-    [[maybe_unused]] const ViSession vi = session_;                                           \
-    return settle(binding_.cname args, noThrow, ivi::returnsNeededSize(#params),               \
-                  std::source_location::current());                                           \
+#define HSDIG_IVI_DEFINE_STATUS(cname, method, ret, sess, params, args)                    \
+  ViStatus IviWrapper::method(HSDIG_IVI_WITH_NOTHROW(HSDIG_IVI_OP_PARAMS(sess, params))) { \
+    [[maybe_unused]] const ViSession vi = session_;                                        \
+    return settle(binding_.cname args, noThrow, ivi::returnsNeededSize(#params),           \
+                  std::source_location::current());                                        \
   }
 #define HSDIG_IVI_DEFINE_VALUE(cname, method, ret, sess, params, args) \
-  ret IviWrapper::method(HSDIG_IVI_OP_PARAMS(sess, params)) {           \
-    [[maybe_unused]] const ViSession vi = session_;                     \
-    return binding_.cname args;                                         \
+  ret IviWrapper::method(HSDIG_IVI_OP_PARAMS(sess, params)) {          \
+    [[maybe_unused]] const ViSession vi = session_;                    \
+    return binding_.cname args;                                        \
   }
 #define HSDIG_IVI_DEFINE_CLASS HSDIG_IVI_DEFINE_VALUE
 #define HSDIG_IVI_DEFINE(cname, method, avail, kind, support, ret, sess, params, args) \
