@@ -229,6 +229,10 @@ TEST_F(FaultTest, DescriptorShortagesFailWithTheirKindsAndLeakNothing) {
 }
 
 TEST_F(FaultTest, ARealDescriptorLimitFailsOpenAndListen) {
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+  GTEST_SKIP() << "the sanitizer runtime needs descriptors of its own to check memory; the "
+                  "injected descriptor shortages above cover this build";
+#endif
   server_ = std::make_unique<TPipeServer>(uniqueName());
   server_->listen();
   rlimit saved{};
