@@ -119,8 +119,8 @@ std::string formatDynamicItems(std::string_view dynamicJson, bool debug) {
   return out;
 }
 
-std::string renderJson1(Translator& translator, int32_t code, const rapidjson::Value* description,
-                        const Json1Request& request) {
+std::string renderJson1(XlatorInterface& translator, int32_t code,
+                        const rapidjson::Value* description, const Json1Request& request) {
   std::string text = translator.getStaticDesc(code, request.language, request.ade);
   if (description == nullptr || !description->IsObject()) return trimLineBreaks(std::move(text));
 

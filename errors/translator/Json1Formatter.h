@@ -25,7 +25,7 @@
 
 namespace hsdig::translator {
 
-class Translator;
+class XlatorInterface;
 
 struct Json1Request {
   int language = 0;
@@ -36,8 +36,8 @@ struct Json1Request {
 
 // The full text of `code` with `description` (a JSON object, or nullptr for
 // none). Throws TranslationFailure for a failed step or a malformed result.
-std::string renderJson1(Translator& translator, int32_t code, const rapidjson::Value* description,
-                        const Json1Request& request);
+std::string renderJson1(XlatorInterface& translator, int32_t code,
+                        const rapidjson::Value* description, const Json1Request& request);
 
 // The lines of a getDynamicDesc result, validated (exposed for tests).
 std::string formatDynamicItems(std::string_view dynamicJson, bool debug);

@@ -52,12 +52,27 @@ class TranslationFailure : public std::runtime_error {
 
 class LuaState;
 
-class Translator {
+// What the text formatting needs of a translator: the built-in one below,
+// or one of the translator manager library.
+class XlatorInterface {
+ public:
+  virtual ~XlatorInterface() = default;
+  // The static description of `code`. Throws TranslationFailure, with the
+  // text found so far as partial text, when a step failed.
+  virtual std::string getStaticDesc(int32_t code, int language, int ade) = 0;
+  // The dynamic items of a description as JSON text
+  // {"dynamic": [...], "debug": [...]}. Throws TranslationFailure; a format
+  // other than "json1" fails with code -52029.
+  virtual std::string getDynamicDesc(std::string_view errjson, int language, int ade,
+                                     std::string_view format) = 0;
+};
+
+class Translator : public XlatorInterface {
  public:
   // Throws TranslationFailure: "failed to create lua state", "failed to add
   // embedded modules to preload table", "lua setupEnv failed".
   Translator(std::string_view settingsJson, std::string sharedFolder);
-  ~Translator();
+  ~Translator() override;
   Translator(const Translator&) = delete;
   Translator& operator=(const Translator&) = delete;
 

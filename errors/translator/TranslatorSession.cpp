@@ -8,6 +8,7 @@
 #include "errors/ErrorDescription.h"
 #include "errors/translator/CodePage.h"
 #include "errors/translator/Json1Formatter.h"
+#include "errors/translator/ManagerLibrary.h"
 #include "errors/translator/SharedFolder.h"
 #include "errors/translator/Translator.h"
 
@@ -63,12 +64,30 @@ struct Attempt {
 
 TranslatorSession::TranslatorSession(TranslatorOptions options) : options_(std::move(options)) {
   if (options_.sharedFolder.empty()) options_.sharedFolder = installSharedFolder();
+  if (options_.builtInOnly) return;
+  ManagerLibrary& library =
+      options_.managerLibrary ? *options_.managerLibrary : ManagerLibrary::process();
+  if (!library.available()) return;
+  try {
+    manager_ = std::make_unique<ManagerSession>(library);
+  } catch (const TranslationFailure&) {
+    // The built-in translator stands in for a manager that cannot serve.
+  }
 }
 
 TranslatorSession::~TranslatorSession() {
+  managedXlators_.clear();
+  manager_.reset();
   for (auto& [name, translator] : translators_) {
     giveToPool(poolKey(options_.sharedFolder, name), std::move(translator));
   }
+}
+
+XlatorInterface& TranslatorSession::xlator(const std::string& name) {
+  if (!manager_) return translator(name);
+  auto found = managedXlators_.find(name);
+  if (found != managedXlators_.end()) return *found->second;
+  return *managedXlators_.emplace(name, manager_->createXlator(name)).first->second;
 }
 
 Translator& TranslatorSession::translator(const std::string& name) {
@@ -118,7 +137,7 @@ Translation TranslatorSession::render(int32_t code, std::string_view description
         }
         name.assign(key->value.GetString(), key->value.GetStringLength());
       }
-      Translator& t = translator(name);
+      XlatorInterface& t = xlator(name);
       if (attempt.form == Form::Full) {
         Json1Request request{language, 0, (attempt.flags & kFlagDebug) != 0, format};
         out.text = renderJson1(t, code, withDescription ? &description : nullptr, request);
@@ -170,7 +189,7 @@ void TranslatorSession::translate(const Status& status, int language, uint32_t f
 std::string TranslatorSession::staticDescription(int32_t code, int language, bool* known) {
   if (known) *known = false;
   try {
-    std::string text = translator(kBuiltInTranslatorName).getStaticDesc(code, language, 0);
+    std::string text = xlator(kBuiltInTranslatorName).getStaticDesc(code, language, 0);
     if (known) *known = text != kDescriptionNotFound;
     return text;
   } catch (const TranslationFailure& failure) {

@@ -11,7 +11,10 @@
 // Descriptions name their translator in "translator"; this system writes
 // "mxlator_hsdig", which is the built-in translator ("mxlator" over the
 // embedded term tables with the settings kTranslatorSettings). A status
-// without a description is rendered by the same translator.
+// without a description is rendered by the same translator. When the
+// translator manager library is installed (ManagerLibrary.h), a session and
+// its translators come from it instead; if it cannot make a session, the
+// built-in translator is used.
 //
 // Flags of `translate`:
 //   bit 0 (kFlagPlain)       plain text, and the fallbacks below are allowed
@@ -37,6 +40,9 @@
 namespace hsdig::translator {
 
 class Translator;
+class XlatorInterface;
+class ManagerLibrary;
+class ManagerSession;
 
 inline constexpr uint32_t kFlagPlain = 0x1;
 inline constexpr uint32_t kFlagDebug = 0x8;
@@ -50,6 +56,11 @@ struct TranslatorOptions {
   // The folder that "$_cvShared32Dir" names; empty means the install-relative
   // shared folder. Tests give each run its own folder.
   std::string sharedFolder;
+  // The translator manager library to use; nullptr means the process-wide
+  // one ("libcvxlator.so", when installed). Tests hand in their own.
+  ManagerLibrary* managerLibrary = nullptr;
+  // Use the built-in translator even when a manager library is installed.
+  bool builtInOnly = false;
 };
 
 // What one translation produced, for callers that want the details.
@@ -84,13 +95,23 @@ class TranslatorSession {
   // Every code of the static table of `language` with its text.
   std::vector<std::pair<int32_t, std::string>> listStaticDescriptions(int language);
 
-  // The translator of that name, created on first use. Throws
-  // TranslationFailure for a name this system does not know.
+  // The translator of that name, created on first use: the manager
+  // library's when the session has one, else the built-in one. Throws
+  // TranslationFailure for a name the built-in translator does not know.
+  XlatorInterface& xlator(const std::string& name);
+
+  // The built-in translator of that name (tests and the code listing).
   Translator& translator(const std::string& name);
+
+  // True when the translators of this session come from the manager library.
+  bool managed() const noexcept { return manager_ != nullptr; }
 
  private:
   TranslatorOptions options_;
   std::map<std::string, std::unique_ptr<Translator>> translators_;
+  // Declared before its translators, so that they end before the session.
+  std::unique_ptr<ManagerSession> manager_;
+  std::map<std::string, std::unique_ptr<XlatorInterface>> managedXlators_;
 };
 
 // Number of idle interpreter states kept per translator and shared folder.
