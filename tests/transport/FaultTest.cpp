@@ -29,7 +29,11 @@ struct Plan {
   std::atomic<int> count{0};
   std::atomic<int> error{0};
   std::atomic<int> seen{0};
+  std::atomic<int> skip{0};  // calls that pass before the failures start
   bool take() {
+    int pass = skip.load();
+    while (pass > 0)
+      if (skip.compare_exchange_weak(pass, pass - 1)) return false;
     int left = count.load();
     while (left > 0)
       if (count.compare_exchange_weak(left, left - 1)) {
@@ -39,9 +43,10 @@ struct Plan {
       }
     return false;
   }
-  void arm(int times, int err) {
+  void arm(int times, int err, int after = 0) {
     error = err;
     seen = 0;
+    skip = after;
     count = times;
   }
 };
@@ -218,6 +223,14 @@ TEST_F(FaultTest, DescriptorShortagesFailWithTheirKindsAndLeakNothing) {
   second.write(reinterpret_cast<const uint8_t*>("!"), 1);
   accepted->readAll(&byte, 1);
   EXPECT_EQ(byte, '!');
+
+  // Taking in the next client fails after this one was accepted.
+  TPipe third(uniqueName());
+  third.open();
+  acceptPlan.arm(1, EPROTO, /*after=*/1);
+  EXPECT_EQ(errorOf([&] { server_->acceptPipe(); }), " TPipeServer ConnectNamedPipe failed");
+  EXPECT_TRUE(test::sawDiagnostic("TPipeServer ConnectNamedPipe failed, GLE=errno = 71"));
+  EXPECT_EQ(third.read(&byte, 1), 0u) << "the client accepted first is not leaked";
 
   // The server cannot create its wait handle: listen fails, nothing is left.
   TPipeServer other(uniqueName("other"));
