@@ -5,6 +5,7 @@
 #include <stdexcept>
 
 #include "errors/translator/EmbeddedModules.h"
+#include "errors/translator/LuaStdio.h"
 #include "errors/translator/NativeFunctions.h"
 #include "errors/translator/StdintModule.h"
 #include "errors/translator/Translator.h"
@@ -66,11 +67,25 @@ int fillPreload(lua_State* L) {
 
 }  // namespace
 
-LuaState::LuaState() : L_(luaL_newstate()) {
+namespace {
+
+lua_State* newState() {
+  prepareLuaStdio();
+  return luaL_newstate();
+}
+
+// Functions of the standard libraries that could end or spawn processes;
+// the translator's scripts never need them.
+constexpr const char* kRemoved = "os.exit = nil os.execute = nil io.popen = nil debug.debug = nil";
+
+}  // namespace
+
+LuaState::LuaState() : L_(newState()) {
   if (L_ == nullptr) throw TranslationFailure(kCodeInternal, "failed to create lua state");
   lua_atpanic(L_, panic);
   try {
     luaL_openlibs(L_);
+    if (luaL_dostring(L_, kRemoved) != 0) throw std::runtime_error("cannot restrict the libraries");
   } catch (...) {
     lua_close(L_);
     throw TranslationFailure(kCodeInternal, "failed to create lua state");

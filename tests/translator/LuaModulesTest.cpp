@@ -41,6 +41,16 @@ TEST_F(LuaModules, NativeModulesAreLinkedIn) {
   EXPECT_EQ(eval("return require('cvmxl_utilities').languageCode(5)"), "chs");
 }
 
+// Inside someone else's process the interpreter neither writes to the
+// console nor ends or spawns processes.
+TEST_F(LuaModules, ScriptsCannotReachTheConsoleOrEndTheProcess) {
+  EXPECT_EQ(eval("print('must not appear') io.write('nor this') return io.read('*l')"), "nil");
+  EXPECT_EQ(eval("return io.stderr:write('discarded') ~= nil"), "true");
+  EXPECT_EQ(
+      eval("return tostring(os.exit) .. ' ' .. tostring(os.execute) .. ' ' .. tostring(io.popen)"),
+      "nil nil nil");
+}
+
 TEST_F(LuaModules, StdintArithmeticAndComparison) {
   struct Case {
     const char* expression;
