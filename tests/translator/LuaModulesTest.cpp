@@ -4,6 +4,7 @@
 
 #include <lua.hpp>
 
+#include <functional>
 #include <string>
 
 #include "errors/translator/Translator.h"
@@ -120,6 +121,72 @@ TEST_F(LuaModules, JsonReaderKeepsLargeIntegersExactAndRefusesBadInput) {
       EXPECT_EQ(result.rfind("error: json: ", 0), 0u) << result;
     } else {
       EXPECT_EQ(result, c.expected);
+    }
+  }
+}
+
+}  // namespace
+}  // namespace hsdig::translator
+
+namespace hsdig::translator {
+namespace {
+
+TEST(TranslatorCreation, FailuresNameTheStepAndRecordTheScriptError) {
+  struct Case {
+    const char* name;
+    const char* settings;
+    const char* message;
+    bool luaRecord;  // an internal-error record with "api" "lua"
+  };
+  const Case cases[] = {
+      {"settings without a translator name", R"({"cvxlatorlua_settings":{}})",
+       "could not find translator key in json", false},
+      {"settings that are not JSON", "{", "could not find translator key in json", false},
+      {"a translator script that does not exist", R"({"cvxlatorlua_xlator":"no_such_script"})",
+       "lua setupEnv failed", true},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.name);
+    try {
+      Translator translator(c.settings, "/nonexistent");
+      ADD_FAILURE() << "created";
+    } catch (const TranslationFailure& failure) {
+      EXPECT_STREQ(failure.what(), c.message);
+      EXPECT_EQ(failure.code(), kCodeInternal);
+      const auto& doc = failure.status().description();
+      bool hasLua = doc.IsObject() && doc.HasMember("internal_error") &&
+                    std::string(doc["internal_error"][0]["api"].GetString()) == "lua";
+      EXPECT_EQ(hasLua, c.luaRecord);
+      if (hasLua) {
+        EXPECT_NE(
+            std::string(doc["internal_error"][0]["string"].GetString()).find("no_such_script"),
+            std::string::npos);
+      }
+    }
+  }
+}
+
+TEST(TranslatorCreation, ATranslatorWithoutOperationsSaysSo) {
+  // A module that loads but offers neither operation.
+  Translator translator(R"({"cvxlatorlua_xlator":"cvmxl_utilities"})", "/nonexistent");
+  struct Case {
+    const char* name;
+    std::function<void()> call;
+    const char* message;
+  };
+  const Case cases[] = {
+      {"static", [&] { translator.getStaticDesc(1, 0, 0); },
+       "xlator doesn't support getStaticDesc"},
+      {"dynamic", [&] { translator.getDynamicDesc("{}", 0, 0, "json1"); },
+       "xlator doesn't support getDynamicDesc"},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.name);
+    try {
+      c.call();
+      ADD_FAILURE() << "succeeded";
+    } catch (const TranslationFailure& failure) {
+      EXPECT_STREQ(failure.what(), c.message);
     }
   }
 }
