@@ -27,9 +27,6 @@ class TPipe;
 
 class TPipeServer : public apache::thrift::transport::TServerTransport {
  public:
-  static constexpr uint32_t kBufferSize = 1024;
-  static constexpr uint32_t kMaxInstances = 255;
-
   // `pipeName` as for TPipe. Nothing is created before listen().
   explicit TPipeServer(const std::string& pipeName);
   ~TPipeServer() override;
