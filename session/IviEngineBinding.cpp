@@ -36,14 +36,38 @@ ViStatus loadFailed(Tag_Ivi_GetErrorMessage, ViStatus status, ViStatus statusCod
   return VI_SUCCESS;
 }
 
+// dlopen of a bare name searches the RUNPATH of the object that calls it.
+// When a sanitizer runtime interposes dlopen, the caller is that runtime and
+// the RUNPATH is lost; the folders it names ($ORIGIN and $ORIGIN/../lib of
+// the object holding this code) are therefore also tried explicitly.
+void* openLibrary(const std::string& name, std::string& failure) {
+  if (void* handle = dlopen(name.c_str(), RTLD_NOW | RTLD_LOCAL)) return handle;
+  const char* why = dlerror();
+  failure += (why ? why : name) + std::string("\n");
+  if (name.find('/') != std::string::npos) return nullptr;
+  Dl_info self{};
+  if (!dladdr(reinterpret_cast<void*>(&openLibrary), &self) || !self.dli_fname) return nullptr;
+  std::string origin = self.dli_fname;
+  const size_t slash = origin.rfind('/');
+  if (slash == std::string::npos) return nullptr;
+  origin.resize(slash);
+  for (const std::string& folder : {origin, origin + "/../lib"}) {
+    const std::string path = folder + "/" + name;
+    if (void* handle = dlopen(path.c_str(), RTLD_NOW | RTLD_LOCAL)) return handle;
+    dlerror();
+  }
+  return nullptr;
+}
+
 }  // namespace
 
 IviEngineBinding::IviEngineBinding(std::vector<std::string> libraryNames)
     : libraryNames_(std::move(libraryNames)) {}
 
-IviEngineBinding::~IviEngineBinding() {
-  if (handle_) dlclose(handle_);
-}
+// A loaded engine stays loaded for the life of the process, whichever
+// binding loaded it: its sessions, and pointers it handed out, outlive any
+// one binding object.
+IviEngineBinding::~IviEngineBinding() = default;
 
 std::vector<std::string> IviEngineBinding::defaultLibraryNames() {
   return {"libcvivi.so", "libivi.so"};
@@ -66,10 +90,8 @@ ViStatus IviEngineBinding::load() {
   void* handle = nullptr;
   lastFailure_.clear();
   for (const auto& name : libraryNames_) {
-    handle = dlopen(name.c_str(), RTLD_NOW | RTLD_LOCAL);
+    handle = openLibrary(name, lastFailure_);
     if (handle) break;
-    const char* why = dlerror();
-    lastFailure_ += (why ? why : name) + std::string("\n");
   }
   if (!handle) return kEngineNotLoaded;
 

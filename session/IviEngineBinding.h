@@ -17,7 +17,7 @@
 //
 // Threads: any thread may call. Loading is serialized by a process mutex;
 // after a successful load the engine stays loaded for the life of the
-// binding (the process binding lives as long as the process).
+// process, also when the binding object goes.
 #pragma once
 
 #include <atomic>
