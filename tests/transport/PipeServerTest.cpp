@@ -9,9 +9,11 @@
 
 #include <cerrno>
 #include <fstream>
+#include <latch>
 #include <memory>
 #include <string>
 #include <thread>
+#include <vector>
 
 #include "TransportTestSupport.h"
 #include "transport/TLocalAuthException.h"
@@ -219,6 +221,50 @@ TEST_F(PipeServerTest, AStaleSocketOfAKilledServerIsReplaced) {
   client.open();
   auto accepted = server.acceptPipe();
   expectPassage(client, *accepted, "new server");
+}
+
+TEST_F(PipeServerTest, ServersRacingForAStaleNameLeaveExactlyOneWinner) {
+  {
+    test::Peer peer({"serve", folder(), uniqueName(), "same"});
+    ASSERT_EQ(peer.readLine(), "listening");
+    peer.kill(SIGKILL);
+  }
+  constexpr int kServers = 6;
+  std::vector<std::unique_ptr<TPipeServer>> servers;
+  for (int i = 0; i < kServers; ++i) servers.push_back(std::make_unique<TPipeServer>(uniqueName()));
+  std::vector<std::string> outcomes(kServers);
+  std::latch start(kServers);
+  std::vector<std::thread> threads;
+  for (int i = 0; i < kServers; ++i)
+    threads.emplace_back([&, i] {
+      start.arrive_and_wait();
+      outcomes[i] = transportErrorOf([&] { servers[i]->listen(); });
+    });
+  for (auto& thread : threads) thread.join();
+
+  int winner = -1;
+  for (int i = 0; i < kServers; ++i) {
+    SCOPED_TRACE(i);
+    if (outcomes[i] == "no exception") {
+      EXPECT_EQ(winner, -1) << "two servers hold one name";
+      winner = i;
+    } else {
+      EXPECT_EQ(outcomes[i], "TCreateNamedPipe() failed: errno = 98");
+    }
+  }
+  ASSERT_NE(winner, -1);
+  // The losers' probes reached the winner as clients that hung up at once.
+  TPipe client(uniqueName());
+  client.open();
+  const std::string text = "to the winner";
+  client.write(reinterpret_cast<const uint8_t*>(text.data()), static_cast<uint32_t>(text.size()));
+  for (;;) {
+    auto accepted = servers[winner]->acceptPipe();
+    uint8_t first;
+    if (accepted->read(&first, 1) == 0) continue;  // a probe
+    EXPECT_EQ(first, 't');
+    break;
+  }
 }
 
 TEST_F(PipeServerTest, ANameTakenByAnotherKindOfFileIsLeftAlone) {
