@@ -35,6 +35,11 @@ template <class THandleWaitPolicy>
 class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitPolicy>> {
  public:
   static constexpr int kDefaultWaitTimeoutMs = 600000;
+  // The pool grows only up to this many threads. Calls on one served session
+  // are serialized by the driver's session lock anyway, so more threads
+  // would only wait there; without a ceiling a busy worker would grow a
+  // thread for nearly every connection it holds.
+  static constexpr std::size_t kMaxThreads = 4;
 
   explicit IOMultiTask(SingleTaskThreadPool& pool) : pool_(pool) {}
   IOMultiTask(const IOMultiTask&) = delete;
@@ -129,7 +134,9 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
         waiting_.fetch_sub(1);
         return;
       }
-      if (waiting_.fetch_sub(1) - 1 < 1) launchAnotherThread();
+      if (waiting_.fetch_sub(1) - 1 < 1 && pool_.activeCount() < kMaxThreads) {
+        launchAnotherThread();
+      }
 
       int i = lastIndex_;
       const bool ready = i >= 0 && static_cast<std::size_t>(i) < tasks_.size() &&

@@ -71,6 +71,12 @@ bool ServerReadWatch::readFrame() {
     std::memmove(frameBuffer_.data(), frameBuffer_.data() + used, bytesBuffered_ - used);
     bytesBuffered_ -= used;
     readState_ = kReadingLength;
+    // A connection that once sent a large request does not keep its buffer.
+    if (frameBuffer_.size() > kShrinkThreshold && bytesBuffered_ <= kInitialBufferSize) {
+      std::vector<uint8_t> small(kInitialBufferSize, 0);
+      std::memcpy(small.data(), frameBuffer_.data(), bytesBuffered_);
+      frameBuffer_.swap(small);
+    }
   }
   bool readThisCall = false;
   if (readState_ == kReadingLength) {

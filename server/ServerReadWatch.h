@@ -44,6 +44,8 @@ class ServerReadWatch : public IOTask, public std::enable_shared_from_this<Serve
     kFrameHandedOver = 1002,
   };
   static constexpr uint32_t kInitialBufferSize = 1024;
+  // A frame buffer grown beyond this is given back once it is drained.
+  static constexpr uint32_t kShrinkThreshold = 1 << 20;
 
   ServerReadWatch(TConcurrentServer& server,
                   std::shared_ptr<apache::thrift::server::TServerEventHandler> eventHandler,

@@ -75,7 +75,12 @@ void TConcurrentServer::add(std::shared_ptr<transport::TPipe> connection) {
     auto config = contract::makeTransportConfiguration();
     auto inputBuffer = std::make_shared<apache::thrift::transport::TMemoryBuffer>(config);
     auto input = protocolFactory_->getProtocol(inputBuffer);
-    auto framed = std::make_shared<apache::thrift::transport::TFramedTransport>(connection, config);
+    // A reply larger than the reclaim threshold leaves no buffer of its size
+    // behind once it has been sent.
+    auto framed = std::make_shared<apache::thrift::transport::TFramedTransport>(
+        connection,
+        static_cast<uint32_t>(apache::thrift::transport::TFramedTransport::DEFAULT_BUFFER_SIZE),
+        kReplyBufferReclaimThreshold, config);
     auto output = protocolFactory_->getProtocol(framed);
     apache::thrift::TConnectionInfo info{input, output, connection};
     auto processor = processorFactory_->getProcessor(info);

@@ -52,6 +52,7 @@ class TConcurrentServer : public TPureConcurrentServer {
  public:
   static constexpr int64_t kInitialThreads = 3;
   static constexpr uint32_t kMaxFrameSize = 0x10000000;
+  static constexpr uint32_t kReplyBufferReclaimThreshold = 1 << 20;
 
   TConcurrentServer(std::shared_ptr<transport::TPipeServer> pipeServer,
                     std::shared_ptr<TConcurrentProcessorFactory> processorFactory,
