@@ -78,6 +78,9 @@ class ConcurrentServer : public test::ServerTest {
   void SetUp() override {
     ServerTest::SetUp();
     diagnostics::installSink(&captureDiagnostic);
+    // Runtimes that start helper threads on the first thread creation (the
+    // thread sanitizer does) have done so before the baseline is taken.
+    std::thread([] {}).join();
     fdsBefore_ = test::openDescriptorCount();
     threadsBefore_ = test::threadCount();
   }
