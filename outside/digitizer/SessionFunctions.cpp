@@ -106,8 +106,7 @@ ViStatus hsdig_InitWithOptions(ViRsrc resourceName, ViBoolean idQuery, ViBoolean
 ViStatus hsdig_close(ViSession vi) {
   ViBoolean locked = VI_FALSE;
   if (Ivi_LockSession(vi, &locked) < 0) {
-    Ivi_SetErrorInfo(0, VI_TRUE, HSDIG_ERROR_INVALID_SESSION, 0,
-                     ("hsdig_close: session " + std::to_string(vi) + " is not open.").c_str());
+    recordStatus(0, HSDIG_ERROR_INVALID_SESSION, 0, "hsdig_close: session " + std::to_string(vi) + " is not open.");
     return HSDIG_ERROR_INVALID_SESSION;
   }
   try {
