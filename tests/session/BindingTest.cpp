@@ -101,6 +101,28 @@ TEST(EngineBinding, MissingOptionalFunctionFailsOnlyThatCall) {
   EXPECT_EQ(wrapper.dispose(), VI_SUCCESS);
 }
 
+// The binding's view of the table: how many functions of each kind it
+// resolves and which it may do without.
+TEST(EngineBinding, TableCounts) {
+  struct Counts {
+    int all = 0, required = 0, value = 0, classDriver = 0;
+  } counts;
+#define HSDIG_COUNT_KIND_STATUS
+#define HSDIG_COUNT_KIND_VALUE ++counts.value;
+#define HSDIG_COUNT_KIND_CLASS ++counts.classDriver;
+#define HSDIG_COUNT(cname, method, avail, kind, support, ret, sess, params, args) \
+  ++counts.all;                                                                   \
+  counts.required += HSDIG_IVI_IS_REQUIRED(avail) ? 1 : 0;                        \
+  IVI_ENGINE_CAT(HSDIG_COUNT_KIND_, kind)
+  IVI_ENGINE_FUNCTIONS(HSDIG_COUNT)
+#undef HSDIG_COUNT
+  EXPECT_EQ(counts.all, 232);
+  EXPECT_EQ(counts.required, 157);
+  EXPECT_EQ(counts.all - counts.required, 75);
+  EXPECT_EQ(counts.value, 16);
+  EXPECT_EQ(counts.classDriver, 8);
+}
+
 TEST(EngineBinding, TheProcessBindingFindsTheEngineByItsBareName) {
   EXPECT_EQ(IviEngineBinding::defaultLibraryNames(),
             (std::vector<std::string>{"libcvivi.so", "libivi.so"}));
