@@ -11,10 +11,10 @@
 #ifndef HSDIG_H
 #define HSDIG_H
 
-#include "hsdigRemote/vitypes.h"
 #include "hsdigAttributes.h"
 #include "hsdigErrors.h"
 #include "hsdigFunctions.h"
+#include "hsdigRemote/vitypes.h"
 
 #ifdef __cplusplus
 extern "C" {
@@ -65,8 +65,9 @@ static_assert(sizeof(hsdigWfmInfo) == 64, "the timing record is 64 bytes");
 static_assert(offsetof(hsdigWfmInfo, absoluteInitialX) == 0 &&
                   offsetof(hsdigWfmInfo, relativeInitialX) == 8 &&
                   offsetof(hsdigWfmInfo, xIncrement) == 16 &&
-                  offsetof(hsdigWfmInfo, actualSamples) == 24 && offsetof(hsdigWfmInfo, offset) == 32 &&
-                  offsetof(hsdigWfmInfo, gain) == 40 && offsetof(hsdigWfmInfo, reserved1) == 48 &&
+                  offsetof(hsdigWfmInfo, actualSamples) == 24 &&
+                  offsetof(hsdigWfmInfo, offset) == 32 && offsetof(hsdigWfmInfo, gain) == 40 &&
+                  offsetof(hsdigWfmInfo, reserved1) == 48 &&
                   offsetof(hsdigWfmInfo, reserved2) == 56,
               "timing record layout");
 static_assert(sizeof(hsdigCoefficientInfo) == 32 && offsetof(hsdigCoefficientInfo, gain) == 8 &&

@@ -188,11 +188,11 @@ enum hsdigAttributeId { HSDIG_ATTRIBUTES(HSDIG_ATTRIBUTE_ID) };
 #define HSDIG_VAL_ACQ_STATUS_UNKNOWN (-1)
 
 /* GetSessionState */
-#define HSDIG_VAL_STATE_IDLE 0       /* configuring */
-#define HSDIG_VAL_STATE_COMMITTED 1  /* configuration applied, not acquiring */
-#define HSDIG_VAL_STATE_ACQUIRING 2  /* initiated, waiting for the trigger or the records */
-#define HSDIG_VAL_STATE_COMPLETE 3   /* the last acquisition holds data */
-#define HSDIG_VAL_STATE_DISABLED 4   /* the channel named is disabled */
+#define HSDIG_VAL_STATE_IDLE 0      /* configuring */
+#define HSDIG_VAL_STATE_COMMITTED 1 /* configuration applied, not acquiring */
+#define HSDIG_VAL_STATE_ACQUIRING 2 /* initiated, waiting for the trigger or the records */
+#define HSDIG_VAL_STATE_COMPLETE 3  /* the last acquisition holds data */
+#define HSDIG_VAL_STATE_DISABLED 4  /* the channel named is disabled */
 
 /* GetAttributeWithOptions... retrievalMode */
 #define HSDIG_VAL_RETRIEVE_CURRENT 0
@@ -211,10 +211,10 @@ enum hsdigAttributeId { HSDIG_ATTRIBUTES(HSDIG_ATTRIBUTE_ID) };
 #define HSDIG_VAL_CAL_RESTRICTED 1
 
 /* CachedFetch dataType: the sample formats and their element sizes. */
-#define HSDIG_VAL_BINARY8 1          /* ViInt8 */
-#define HSDIG_VAL_BINARY16 2         /* ViInt16 */
-#define HSDIG_VAL_BINARY32 4         /* ViInt32 */
-#define HSDIG_VAL_REAL64 8           /* ViReal64 volts */
+#define HSDIG_VAL_BINARY8 1             /* ViInt8 */
+#define HSDIG_VAL_BINARY16 2            /* ViInt16 */
+#define HSDIG_VAL_BINARY32 4            /* ViInt32 */
+#define HSDIG_VAL_REAL64 8              /* ViReal64 volts */
 #define HSDIG_VAL_COMPLEX_BINARY8 1000  /* ViInt8 pair */
 #define HSDIG_VAL_COMPLEX_BINARY16 1001 /* ViInt16 pair */
 #define HSDIG_VAL_COMPLEX_BINARY32 1002 /* ViInt32 pair */
@@ -235,22 +235,22 @@ enum hsdigAttributeId { HSDIG_ATTRIBUTES(HSDIG_ATTRIBUTE_ID) };
  * ClearWaveformMeasurementStats). Levels are 10/50/90 % between the
  * waveform's low and high (the most common values near its minimum and
  * maximum). */
-#define HSDIG_SCALAR_MEASUREMENTS(X)    \
-  X(RISE_TIME, 0)            /* s */    \
-  X(FALL_TIME, 1)            /* s */    \
-  X(FREQUENCY, 2)            /* Hz */   \
-  X(PERIOD, 3)               /* s */    \
-  X(VOLTAGE_RMS, 4)          /* V */    \
-  X(VOLTAGE_PEAK_TO_PEAK, 5) /* V */    \
-  X(VOLTAGE_MAX, 6)          /* V */    \
-  X(VOLTAGE_MIN, 7)          /* V */    \
-  X(VOLTAGE_HIGH, 8)         /* V */    \
-  X(VOLTAGE_LOW, 9)          /* V */    \
-  X(VOLTAGE_AVERAGE, 10)     /* V */    \
-  X(WIDTH_NEG, 11)           /* s */    \
-  X(WIDTH_POS, 12)           /* s */    \
-  X(DUTY_CYCLE_NEG, 13)      /* % */    \
-  X(DUTY_CYCLE_POS, 14)      /* % */    \
+#define HSDIG_SCALAR_MEASUREMENTS(X)  \
+  X(RISE_TIME, 0)            /* s */  \
+  X(FALL_TIME, 1)            /* s */  \
+  X(FREQUENCY, 2)            /* Hz */ \
+  X(PERIOD, 3)               /* s */  \
+  X(VOLTAGE_RMS, 4)          /* V */  \
+  X(VOLTAGE_PEAK_TO_PEAK, 5) /* V */  \
+  X(VOLTAGE_MAX, 6)          /* V */  \
+  X(VOLTAGE_MIN, 7)          /* V */  \
+  X(VOLTAGE_HIGH, 8)         /* V */  \
+  X(VOLTAGE_LOW, 9)          /* V */  \
+  X(VOLTAGE_AVERAGE, 10)     /* V */  \
+  X(WIDTH_NEG, 11)           /* s */  \
+  X(WIDTH_POS, 12)           /* s */  \
+  X(DUTY_CYCLE_NEG, 13)      /* % */  \
+  X(DUTY_CYCLE_POS, 14)      /* % */  \
   X(AMPLITUDE, 15)           /* V */
 #define HSDIG_MEAS_ID(NAME, id) HSDIG_MEAS_##NAME = id,
 enum hsdigScalarMeasurement { HSDIG_SCALAR_MEASUREMENTS(HSDIG_MEAS_ID) };
@@ -261,16 +261,16 @@ enum hsdigScalarMeasurement { HSDIG_SCALAR_MEASUREMENTS(HSDIG_MEAS_ID) };
  * Time-domain functions keep the record length and x increment; the FFT
  * spectra have 2^k / 2 + 1 points (2^k the record length rounded up to a
  * power of two, zero padded), start at 0 Hz and step sampleRate / 2^k. */
-#define HSDIG_ARRAY_MEASUREMENTS(X)                                     \
-  X(ARRAY_NONE, 1000)             /* the scaled waveform itself */     \
-  X(ARRAY_NEGATE, 1001)           /* -v */                             \
-  X(ARRAY_ABSOLUTE, 1002)         /* |v| */                            \
-  X(ARRAY_SQUARE, 1003)           /* v^2 */                            \
-  X(ARRAY_DC_REMOVE, 1004)        /* v - mean */                       \
-  X(ARRAY_DERIVATIVE, 1005)       /* dv/dt, central differences */     \
-  X(ARRAY_INTEGRAL, 1006)         /* running trapezoidal integral */   \
-  X(FFT_AMP_SPECTRUM_VOLTS_RMS, 1007) /* V RMS per bin */              \
-  X(FFT_AMP_SPECTRUM_DB, 1008)    /* dB relative to 1 V RMS */
+#define HSDIG_ARRAY_MEASUREMENTS(X)                                      \
+  X(ARRAY_NONE, 1000)                 /* the scaled waveform itself */   \
+  X(ARRAY_NEGATE, 1001)               /* -v */                           \
+  X(ARRAY_ABSOLUTE, 1002)             /* |v| */                          \
+  X(ARRAY_SQUARE, 1003)               /* v^2 */                          \
+  X(ARRAY_DC_REMOVE, 1004)            /* v - mean */                     \
+  X(ARRAY_DERIVATIVE, 1005)           /* dv/dt, central differences */   \
+  X(ARRAY_INTEGRAL, 1006)             /* running trapezoidal integral */ \
+  X(FFT_AMP_SPECTRUM_VOLTS_RMS, 1007) /* V RMS per bin */                \
+  X(FFT_AMP_SPECTRUM_DB, 1008)        /* dB relative to 1 V RMS */
 enum hsdigArrayMeasurement { HSDIG_ARRAY_MEASUREMENTS(HSDIG_MEAS_ID) };
 #undef HSDIG_MEAS_ID
 

@@ -23,9 +23,12 @@ struct Format {
   size_t bytes;  // per sample
 };
 const Format kFormats[] = {
-    {"Binary16", HSDIG_VAL_BINARY16, 2},     {"Binary8", HSDIG_VAL_BINARY8, 1},
-    {"Binary32", HSDIG_VAL_BINARY32, 4},     {"Real64", HSDIG_VAL_REAL64, 8},
-    {"ComplexBinary16", HSDIG_VAL_COMPLEX_BINARY16, 4}, {"ComplexReal64", HSDIG_VAL_COMPLEX_REAL64, 16},
+    {"Binary16", HSDIG_VAL_BINARY16, 2},
+    {"Binary8", HSDIG_VAL_BINARY8, 1},
+    {"Binary32", HSDIG_VAL_BINARY32, 4},
+    {"Real64", HSDIG_VAL_REAL64, 8},
+    {"ComplexBinary16", HSDIG_VAL_COMPLEX_BINARY16, 4},
+    {"ComplexReal64", HSDIG_VAL_COMPLEX_REAL64, 16},
 };
 
 std::vector<char>& buffer() {
@@ -35,13 +38,19 @@ std::vector<char>& buffer() {
 
 ViStatus fetch(const Format& f, void* out, hsdigWfmInfo* info) {
   switch (f.dataType) {
-    case HSDIG_VAL_BINARY16: return hsdig_FetchBinary16(session, "0", 10.0, kSamples, static_cast<ViInt16*>(out), info);
-    case HSDIG_VAL_BINARY8: return hsdig_FetchBinary8(session, "0", 10.0, kSamples, static_cast<ViInt8*>(out), info);
-    case HSDIG_VAL_BINARY32: return hsdig_FetchBinary32(session, "0", 10.0, kSamples, static_cast<ViInt32*>(out), info);
-    case HSDIG_VAL_REAL64: return hsdig_Fetch(session, "0", 10.0, kSamples, static_cast<ViReal64*>(out), info);
+    case HSDIG_VAL_BINARY16:
+      return hsdig_FetchBinary16(session, "0", 10.0, kSamples, static_cast<ViInt16*>(out), info);
+    case HSDIG_VAL_BINARY8:
+      return hsdig_FetchBinary8(session, "0", 10.0, kSamples, static_cast<ViInt8*>(out), info);
+    case HSDIG_VAL_BINARY32:
+      return hsdig_FetchBinary32(session, "0", 10.0, kSamples, static_cast<ViInt32*>(out), info);
+    case HSDIG_VAL_REAL64:
+      return hsdig_Fetch(session, "0", 10.0, kSamples, static_cast<ViReal64*>(out), info);
     case HSDIG_VAL_COMPLEX_BINARY16:
-      return hsdig_FetchComplexBinary16(session, "0", 10.0, kSamples, static_cast<ViInt16*>(out), info);
-    default: return hsdig_FetchComplex(session, "0", 10.0, kSamples, static_cast<ViReal64*>(out), info);
+      return hsdig_FetchComplexBinary16(session, "0", 10.0, kSamples, static_cast<ViInt16*>(out),
+                                        info);
+    default:
+      return hsdig_FetchComplex(session, "0", 10.0, kSamples, static_cast<ViReal64*>(out), info);
   }
 }
 
@@ -80,7 +89,8 @@ class RatioReporter : public benchmark::ConsoleReporter {
  public:
   void ReportRuns(const std::vector<Run>& runs) override {
     for (const Run& r : runs) {
-      if (r.iterations > 0) seconds[r.benchmark_name()] = r.real_accumulated_time / static_cast<double>(r.iterations);
+      if (r.iterations > 0)
+        seconds[r.benchmark_name()] = r.real_accumulated_time / static_cast<double>(r.iterations);
     }
     ConsoleReporter::ReportRuns(runs);
   }
@@ -91,7 +101,8 @@ class RatioReporter : public benchmark::ConsoleReporter {
 
 int main(int argc, char** argv) {
   benchmark::Initialize(&argc, argv);
-  if (hsdig_InitWithOptions(const_cast<ViRsrc>("SIM::BENCH"), VI_FALSE, VI_FALSE, "", &session) < 0 ||
+  if (hsdig_InitWithOptions(const_cast<ViRsrc>("SIM::BENCH"), VI_FALSE, VI_FALSE, "", &session) <
+          0 ||
       hsdig_ConfigureHorizontalTiming(session, 250e6, kSamples, 0.0, 1, VI_TRUE) < 0 ||
       hsdig_SetAttributeViReal64(session, "0", HSDIG_ATTR_SIGNAL_NOISE, 0.01) < 0 ||
       hsdig_InitiateAcquisition(session) < 0) {
@@ -101,24 +112,29 @@ int main(int argc, char** argv) {
   // The first fetch waits for the acquisition and fills its memory; the
   // measured fetches only move data.
   hsdigWfmInfo info{};
-  if (hsdig_FetchBinary16(session, "0", 10.0, kSamples, reinterpret_cast<ViInt16*>(buffer().data()), &info) < 0) {
+  if (hsdig_FetchBinary16(session, "0", 10.0, kSamples, reinterpret_cast<ViInt16*>(buffer().data()),
+                          &info) < 0) {
     std::fprintf(stderr, "the first fetch failed\n");
     return 1;
   }
   for (const Format& f : kFormats) {
-    benchmark::RegisterBenchmark((std::string("Fetch/") + f.name).c_str(), BM_Fetch, &f)->Unit(benchmark::kMillisecond);
-    benchmark::RegisterBenchmark((std::string("Memcpy/") + f.name).c_str(), BM_Memcpy, &f)->Unit(benchmark::kMillisecond);
+    benchmark::RegisterBenchmark((std::string("Fetch/") + f.name).c_str(), BM_Fetch, &f)
+        ->Unit(benchmark::kMillisecond);
+    benchmark::RegisterBenchmark((std::string("Memcpy/") + f.name).c_str(), BM_Memcpy, &f)
+        ->Unit(benchmark::kMillisecond);
   }
-  benchmark::RegisterBenchmark("AcquireAndFetch/Binary16", BM_Acquire)->Unit(benchmark::kMillisecond);
+  benchmark::RegisterBenchmark("AcquireAndFetch/Binary16", BM_Acquire)
+      ->Unit(benchmark::kMillisecond);
   RatioReporter reporter;
   benchmark::RunSpecifiedBenchmarks(&reporter);
-  std::printf("\n%-16s %16s %16s %12s\n", "format", "fetch samples/s", "memcpy samples/s", "fetch/memcpy");
+  std::printf("\n%-16s %16s %16s %12s\n", "format", "fetch samples/s", "memcpy samples/s",
+              "fetch/memcpy");
   for (const Format& f : kFormats) {
     auto fetchIt = reporter.seconds.find(std::string("Fetch/") + f.name);
     auto copyIt = reporter.seconds.find(std::string("Memcpy/") + f.name);
     if (fetchIt == reporter.seconds.end() || copyIt == reporter.seconds.end()) continue;
-    std::printf("%-16s %16.3e %16.3e %12.2f\n", f.name, kSamples / fetchIt->second, kSamples / copyIt->second,
-                fetchIt->second / copyIt->second);
+    std::printf("%-16s %16.3e %16.3e %12.2f\n", f.name, kSamples / fetchIt->second,
+                kSamples / copyIt->second, fetchIt->second / copyIt->second);
   }
   hsdig_close(session);
   benchmark::Shutdown();

@@ -22,15 +22,22 @@ namespace hsdig::sim {
 
 namespace {
 
-double fraction(double x) { return x - std::floor(x); }
+double fraction(double x) {
+  return x - std::floor(x);
+}
 
 double shapeAt(ViInt32 shape, double p, double duty) {
   switch (shape) {
-    case HSDIG_VAL_SHAPE_SINE: return std::sin(2 * std::numbers::pi * p);
-    case HSDIG_VAL_SHAPE_SQUARE: return p < duty / 100.0 ? 1.0 : -1.0;
-    case HSDIG_VAL_SHAPE_TRIANGLE: return p < 0.5 ? -1.0 + 4.0 * p : 3.0 - 4.0 * p;
-    case HSDIG_VAL_SHAPE_SAWTOOTH: return -1.0 + 2.0 * p;
-    default: return 0.0;
+    case HSDIG_VAL_SHAPE_SINE:
+      return std::sin(2 * std::numbers::pi * p);
+    case HSDIG_VAL_SHAPE_SQUARE:
+      return p < duty / 100.0 ? 1.0 : -1.0;
+    case HSDIG_VAL_SHAPE_TRIANGLE:
+      return p < 0.5 ? -1.0 + 4.0 * p : 3.0 - 4.0 * p;
+    case HSDIG_VAL_SHAPE_SAWTOOTH:
+      return -1.0 + 2.0 * p;
+    default:
+      return 0.0;
   }
 }
 
@@ -43,7 +50,8 @@ Levels levelsOf(const ChannelSetup& c) {
   Levels l;
   if (c.coupling == HSDIG_VAL_GND) return l;
   double bw = c.bandwidth > 0 ? c.bandwidth : 1e30;
-  double h = c.shape == HSDIG_VAL_SHAPE_DC ? 0.0 : 1.0 / std::sqrt(1.0 + std::pow(c.frequency / bw, 2));
+  double h =
+      c.shape == HSDIG_VAL_SHAPE_DC ? 0.0 : 1.0 / std::sqrt(1.0 + std::pow(c.frequency / bw, 2));
   l.ac = c.attenuation * c.amplitude * h;
   l.dc = c.coupling == HSDIG_VAL_DC ? c.attenuation * c.signalOffset : 0.0;
   return l;
@@ -68,7 +76,8 @@ struct Noise {
     s ^= s << 25;
     s ^= s >> 27;
     const std::uint64_t r = s * 0x2545F4914F6CDD1Dull;
-    const double sum = static_cast<double>((r & 0xFFFF) + ((r >> 16) & 0xFFFF) + ((r >> 32) & 0xFFFF) + (r >> 48));
+    const double sum =
+        static_cast<double>((r & 0xFFFF) + ((r >> 16) & 0xFFFF) + ((r >> 32) & 0xFFFF) + (r >> 48));
     return (sum * (1.0 / 65536.0) - 2.0) * 1.7320508075688772;
   }
 };
@@ -162,7 +171,8 @@ void materialize(Acquisition& a) {
   a.materialized = true;
 }
 
-void planTriggers(Digitizer& d, Acquisition& a, const std::string& source, double level, ViInt32 slope) {
+void planTriggers(Digitizer& d, Acquisition& a, const std::string& source, double level,
+                  ViInt32 slope) {
   const double recordTime = a.recordLength / a.sampleRate + a.holdoff;
   const double start = a.startNanoseconds * 1e-9;
   a.triggerTimes.resize(static_cast<size_t>(a.numRecords));
@@ -202,7 +212,8 @@ void planTriggers(Digitizer& d, Acquisition& a, const std::string& source, doubl
     // The first crossing after the start, then whole periods apart.
     double first = (std::floor(start / period) + 1 + crossing) * period;
     double step = std::ceil(recordTime / period) * period;
-    for (std::int32_t r = 0; r < a.numRecords; ++r) a.triggerTimes[static_cast<size_t>(r)] = first + r * step;
+    for (std::int32_t r = 0; r < a.numRecords; ++r)
+      a.triggerTimes[static_cast<size_t>(r)] = first + r * step;
     return;
   }
   for (std::int32_t r = 0; r < a.numRecords; ++r) {
@@ -234,10 +245,11 @@ std::shared_ptr<Acquisition> Digitizer::waitForData(double timeout) {
       // without limit would never end: such a wait fails at once.
       if (timeout > 0 && limit != Clock::time_point::max()) std::this_thread::sleep_until(limit);
       const char* why = current->waitsForSoftwareTrigger ? "the software trigger has not been sent"
-                        : current->neverTriggers ? "the trigger condition does not occur on the source signal"
-                                                 : "the records are not yet acquired";
-      fail(HSDIG_ERROR_FETCH_TIMEOUT, "The acquisition did not complete within " + std::to_string(timeout) +
-                                          " s: " + why + ".");
+                        : current->neverTriggers
+                            ? "the trigger condition does not occur on the source signal"
+                            : "the records are not yet acquired";
+      fail(HSDIG_ERROR_FETCH_TIMEOUT, "The acquisition did not complete within " +
+                                          std::to_string(timeout) + " s: " + why + ".");
     }
     std::this_thread::sleep_until(current->completesAt);
     update();
@@ -249,7 +261,8 @@ std::shared_ptr<Acquisition> Digitizer::waitForData(double timeout) {
 std::shared_ptr<Acquisition> Digitizer::cachedData() {
   update();
   std::shared_ptr<Acquisition> a = state == AcqState::Complete ? current : lastComplete;
-  if (!a) fail(HSDIG_ERROR_NO_ACQUISITION, "No acquisition has completed yet, so nothing is cached.");
+  if (!a)
+    fail(HSDIG_ERROR_NO_ACQUISITION, "No acquisition has completed yet, so nothing is cached.");
   materialize(*a);
   return a;
 }
@@ -260,8 +273,8 @@ void Digitizer::commit() {
   if (length * records > model.memory) {
     fail(HSDIG_ERROR_ACQUISITION_MEMORY,
          std::to_string(records) + " records of " + std::to_string(length) + " samples need " +
-             std::to_string(length * records) + " samples per channel; the " + model.name + " holds " +
-             std::to_string(model.memory) + ".");
+             std::to_string(length * records) + " samples per channel; the " + model.name +
+             " holds " + std::to_string(model.memory) + ".");
   }
   const ViInt32 type = getInt32(vi, "", HSDIG_ATTR_TRIGGER_TYPE);
   if (type != HSDIG_VAL_IMMEDIATE_TRIGGER && type != HSDIG_VAL_SOFTWARE_TRIGGER) {
@@ -270,8 +283,9 @@ void Digitizer::commit() {
                    std::atoi(source.c_str()) < model.channels;
     bool external = source == "External" || source == "PFI0" || source == "PFI1";
     if (!channel && !external) {
-      fail(HSDIG_ERROR_INVALID_TRIGGER_SOURCE, "The trigger source \"" + source + "\" is not a channel of the " +
-                                                   model.name + ", \"External\", \"PFI0\" or \"PFI1\".");
+      fail(HSDIG_ERROR_INVALID_TRIGGER_SOURCE, "The trigger source \"" + source +
+                                                   "\" is not a channel of the " + model.name +
+                                                   ", \"External\", \"PFI0\" or \"PFI1\".");
     }
   }
   if (state == AcqState::Idle) state = AcqState::Committed;
@@ -323,12 +337,13 @@ void Digitizer::initiate() {
     case HSDIG_VAL_HYSTERESIS_TRIGGER:
     case HSDIG_VAL_WIDTH_TRIGGER:
     case HSDIG_VAL_GLITCH_TRIGGER:
-      planTriggers(*this, *a, source, getReal64(vi, "", HSDIG_ATTR_TRIGGER_LEVEL),
-                   a->triggerType == HSDIG_VAL_EDGE_TRIGGER || a->triggerType == HSDIG_VAL_HYSTERESIS_TRIGGER
-                       ? getInt32(vi, "", HSDIG_ATTR_TRIGGER_SLOPE)
-                       : (getInt32(vi, "", HSDIG_ATTR_TRIGGER_POLARITY) == HSDIG_VAL_POLARITY_NEGATIVE
-                              ? HSDIG_VAL_NEGATIVE
-                              : HSDIG_VAL_POSITIVE));
+      planTriggers(
+          *this, *a, source, getReal64(vi, "", HSDIG_ATTR_TRIGGER_LEVEL),
+          a->triggerType == HSDIG_VAL_EDGE_TRIGGER || a->triggerType == HSDIG_VAL_HYSTERESIS_TRIGGER
+              ? getInt32(vi, "", HSDIG_ATTR_TRIGGER_SLOPE)
+              : (getInt32(vi, "", HSDIG_ATTR_TRIGGER_POLARITY) == HSDIG_VAL_POLARITY_NEGATIVE
+                     ? HSDIG_VAL_NEGATIVE
+                     : HSDIG_VAL_POSITIVE));
       break;
     case HSDIG_VAL_WINDOW_TRIGGER:
     case HSDIG_VAL_RUNT_TRIGGER: {

@@ -37,7 +37,8 @@ ViStatus callDriver(ViSession vi, const char* function, Body&& body) noexcept {
     }
   } catch (const DriverError& e) {
     status = e.code;
-    recordStatus(locked ? vi : 0, e.code, e.secondary, std::string(function) + ": " + e.elaboration);
+    recordStatus(locked ? vi : 0, e.code, e.secondary,
+                 std::string(function) + ": " + e.elaboration);
   } catch (const std::bad_alloc&) {
     status = HSDIG_ERROR_INTERNAL;
     recordStatus(locked ? vi : 0, status, 0, std::string(function) + ": out of memory.");

@@ -63,9 +63,12 @@ bool unhex(std::string_view s, std::string& out) {
 std::string valueText(ViSession vi, const AttributeInfo& a, const char* ch) {
   char buf[64];
   switch (a.type) {
-    case IVI_VAL_INT32: return std::to_string(getInt32(vi, ch, a.id));
-    case IVI_VAL_INT64: return std::to_string(getInt64(vi, ch, a.id));
-    case IVI_VAL_BOOLEAN: return getBoolean(vi, ch, a.id) ? "1" : "0";
+    case IVI_VAL_INT32:
+      return std::to_string(getInt32(vi, ch, a.id));
+    case IVI_VAL_INT64:
+      return std::to_string(getInt64(vi, ch, a.id));
+    case IVI_VAL_BOOLEAN:
+      return getBoolean(vi, ch, a.id) ? "1" : "0";
     case IVI_VAL_SESSION: {
       ViSession v = 0;
       checkEngine(Ivi_GetAttributeViSession(vi, ch, a.id, 0, &v), "Reading a session attribute.");
@@ -74,7 +77,8 @@ std::string valueText(ViSession vi, const AttributeInfo& a, const char* ch) {
     case IVI_VAL_REAL64:
       std::snprintf(buf, sizeof buf, "%.17g", getReal64(vi, ch, a.id));
       return buf;
-    default: return hex(getString(vi, ch, a.id));
+    default:
+      return hex(getString(vi, ch, a.id));
   }
 }
 
@@ -87,7 +91,8 @@ struct Item {
 };
 
 [[noreturn]] void damaged(int line, const std::string& why) {
-  fail(HSDIG_ERROR_CONFIGURATION_DATA, "Line " + std::to_string(line) + " of the configuration: " + why);
+  fail(HSDIG_ERROR_CONFIGURATION_DATA,
+       "Line " + std::to_string(line) + " of the configuration: " + why);
 }
 
 }  // namespace
@@ -99,7 +104,8 @@ std::string exportConfiguration(Digitizer& d) {
     const int count = a.perChannel ? d.model.channels : 1;
     for (int c = 0; c < count; ++c) {
       std::string ch = a.perChannel ? channelName(c) : "";
-      out += std::string(a.name) + " " + (a.perChannel ? ch : "-") + " " + valueText(d.vi, a, ch.c_str()) + "\n";
+      out += std::string(a.name) + " " + (a.perChannel ? ch : "-") + " " +
+             valueText(d.vi, a, ch.c_str()) + "\n";
     }
   }
   char sum[40];
@@ -112,7 +118,8 @@ void importConfiguration(Digitizer& d, std::string_view text) {
   size_t end = text.size();
   if (end && text[end - 1] == '\n') --end;
   size_t lastStart = text.rfind('\n', end ? end - 1 : 0);
-  if (lastStart == std::string_view::npos || end == 0) damaged(1, "the text is empty or has no checksum line.");
+  if (lastStart == std::string_view::npos || end == 0)
+    damaged(1, "the text is empty or has no checksum line.");
   std::string_view body = text.substr(0, lastStart + 1);
   std::string_view last = text.substr(lastStart + 1, end - lastStart - 1);
   char expected[40];
@@ -134,12 +141,14 @@ void importConfiguration(Digitizer& d, std::string_view text) {
     words >> name >> channel;
     if (number == 2) {
       if (name != "model" || channel != d.model.name) {
-        damaged(number, "the configuration was made for model \"" + channel + "\", this is a " + d.model.name + ".");
+        damaged(number, "the configuration was made for model \"" + channel + "\", this is a " +
+                            d.model.name + ".");
       }
       continue;
     }
     words >> value;
-    if (name.empty() || value.empty() || (words >> extra)) damaged(number, "it is not \"NAME CHANNEL VALUE\".");
+    if (name.empty() || value.empty() || (words >> extra))
+      damaged(number, "it is not \"NAME CHANNEL VALUE\".");
     const AttributeInfo* a = nullptr;
     for (const AttributeInfo& candidate : allAttributes()) {
       if (name == candidate.name) a = &candidate;
@@ -151,7 +160,8 @@ void importConfiguration(Digitizer& d, std::string_view text) {
     if (a->perChannel) {
       char* stop = nullptr;
       long c = std::strtol(channel.c_str(), &stop, 10);
-      if (channel.empty() || *stop || c < 0 || c >= d.model.channels) damaged(number, "bad channel \"" + channel + "\".");
+      if (channel.empty() || *stop || c < 0 || c >= d.model.channels)
+        damaged(number, "bad channel \"" + channel + "\".");
     } else if (channel != "-") {
       damaged(number, "a session attribute takes \"-\" as its channel.");
     }
@@ -163,13 +173,16 @@ void importConfiguration(Digitizer& d, std::string_view text) {
         break;
       case IVI_VAL_REAL64:
         item.number = std::strtod(value.c_str(), &stop);
-        if (*stop || errno || !std::isfinite(item.number)) damaged(number, "\"" + value + "\" is not a number.");
-        if (item.number < a->min || item.number > a->max) damaged(number, "the value is out of range.");
+        if (*stop || errno || !std::isfinite(item.number))
+          damaged(number, "\"" + value + "\" is not a number.");
+        if (item.number < a->min || item.number > a->max)
+          damaged(number, "the value is out of range.");
         break;
       default:
         item.integer = std::strtoll(value.c_str(), &stop, 10);
         if (*stop || errno) damaged(number, "\"" + value + "\" is not an integer.");
-        if (static_cast<double>(item.integer) < a->min || static_cast<double>(item.integer) > a->max) {
+        if (static_cast<double>(item.integer) < a->min ||
+            static_cast<double>(item.integer) > a->max) {
           damaged(number, "the value is out of range.");
         }
         break;
@@ -182,12 +195,27 @@ void importConfiguration(Digitizer& d, std::string_view text) {
     const ViInt32 flags = IVI_VAL_DIRECT_USER_CALL;
     ViStatus st = VI_SUCCESS;
     switch (it.attribute->type) {
-      case IVI_VAL_INT32: st = Ivi_SetAttributeViInt32(d.vi, ch, it.attribute->id, flags, static_cast<ViInt32>(it.integer)); break;
-      case IVI_VAL_INT64: st = Ivi_SetAttributeViInt64(d.vi, ch, it.attribute->id, flags, it.integer); break;
-      case IVI_VAL_BOOLEAN: st = Ivi_SetAttributeViBoolean(d.vi, ch, it.attribute->id, flags, it.integer ? VI_TRUE : VI_FALSE); break;
-      case IVI_VAL_SESSION: st = Ivi_SetAttributeViSession(d.vi, ch, it.attribute->id, flags, static_cast<ViSession>(it.integer)); break;
-      case IVI_VAL_REAL64: st = Ivi_SetAttributeViReal64(d.vi, ch, it.attribute->id, flags, it.number); break;
-      default: st = Ivi_SetAttributeViString(d.vi, ch, it.attribute->id, flags, it.text.c_str()); break;
+      case IVI_VAL_INT32:
+        st = Ivi_SetAttributeViInt32(d.vi, ch, it.attribute->id, flags,
+                                     static_cast<ViInt32>(it.integer));
+        break;
+      case IVI_VAL_INT64:
+        st = Ivi_SetAttributeViInt64(d.vi, ch, it.attribute->id, flags, it.integer);
+        break;
+      case IVI_VAL_BOOLEAN:
+        st = Ivi_SetAttributeViBoolean(d.vi, ch, it.attribute->id, flags,
+                                       it.integer ? VI_TRUE : VI_FALSE);
+        break;
+      case IVI_VAL_SESSION:
+        st = Ivi_SetAttributeViSession(d.vi, ch, it.attribute->id, flags,
+                                       static_cast<ViSession>(it.integer));
+        break;
+      case IVI_VAL_REAL64:
+        st = Ivi_SetAttributeViReal64(d.vi, ch, it.attribute->id, flags, it.number);
+        break;
+      default:
+        st = Ivi_SetAttributeViString(d.vi, ch, it.attribute->id, flags, it.text.c_str());
+        break;
     }
     checkEngine(st, std::string("Applying ") + it.attribute->name + ".");
   }

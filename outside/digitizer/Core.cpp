@@ -26,8 +26,7 @@ const std::vector<Model>& allModels() {
 const Model* findModel(std::string_view name) {
   for (const Model& m : allModels()) {
     std::string_view n = m.name;
-    if (n.size() == name.size() &&
-        std::equal(n.begin(), n.end(), name.begin(), [](char a, char b) {
+    if (n.size() == name.size() && std::equal(n.begin(), n.end(), name.begin(), [](char a, char b) {
           return std::tolower(static_cast<unsigned char>(a)) ==
                  std::tolower(static_cast<unsigned char>(b));
         })) {
@@ -37,7 +36,9 @@ const Model* findModel(std::string_view name) {
   return nullptr;
 }
 
-const Model& defaultModel() { return allModels()[2]; }
+const Model& defaultModel() {
+  return allModels()[2];
+}
 
 // ---- Errors ----------------------------------------------------------------
 void fail(ViStatus code, std::string elaboration, ViStatus secondary) {
@@ -48,23 +49,42 @@ ViStatus checkEngine(ViStatus st, std::string_view what) {
   if (st >= 0) return st;
   ViStatus code = st;
   switch (st) {
-    case IVI_ERROR_INVALID_SESSION_HANDLE: code = HSDIG_ERROR_INVALID_SESSION; break;
+    case IVI_ERROR_INVALID_SESSION_HANDLE:
+      code = HSDIG_ERROR_INVALID_SESSION;
+      break;
     case IVI_ERROR_UNKNOWN_CHANNEL_NAME:
     case IVI_ERROR_CHANNEL_NAME_REQUIRED:
     case IVI_ERROR_CHANNEL_NAME_NOT_ALLOWED:
-    case IVI_ERROR_NO_CHANNEL_TABLE: code = HSDIG_ERROR_INVALID_CHANNEL; break;
+    case IVI_ERROR_NO_CHANNEL_TABLE:
+      code = HSDIG_ERROR_INVALID_CHANNEL;
+      break;
     case IVI_ERROR_INVALID_ATTRIBUTE:
-    case IVI_ERROR_ATTRIBUTE_NOT_SUPPORTED: code = HSDIG_ERROR_INVALID_ATTRIBUTE; break;
+    case IVI_ERROR_ATTRIBUTE_NOT_SUPPORTED:
+      code = HSDIG_ERROR_INVALID_ATTRIBUTE;
+      break;
     case IVI_ERROR_TYPES_DO_NOT_MATCH:
-    case IVI_ERROR_INVALID_TYPE: code = HSDIG_ERROR_ATTRIBUTE_TYPE; break;
+    case IVI_ERROR_INVALID_TYPE:
+      code = HSDIG_ERROR_ATTRIBUTE_TYPE;
+      break;
     case IVI_ERROR_ATTRIBUTE_NOT_READABLE:
-    case IVI_ERROR_ATTRIBUTE_NOT_WRITABLE: code = HSDIG_ERROR_ATTRIBUTE_ACCESS; break;
-    case IVI_ERROR_INVALID_VALUE: code = HSDIG_ERROR_VALUE_OUT_OF_RANGE; break;
-    case IVI_ERROR_NULL_POINTER: code = HSDIG_ERROR_NULL_POINTER; break;
+    case IVI_ERROR_ATTRIBUTE_NOT_WRITABLE:
+      code = HSDIG_ERROR_ATTRIBUTE_ACCESS;
+      break;
+    case IVI_ERROR_INVALID_VALUE:
+      code = HSDIG_ERROR_VALUE_OUT_OF_RANGE;
+      break;
+    case IVI_ERROR_NULL_POINTER:
+      code = HSDIG_ERROR_NULL_POINTER;
+      break;
     case IVI_ERROR_BAD_OPTION_NAME:
-    case IVI_ERROR_BAD_OPTION_VALUE: code = HSDIG_ERROR_OPTION_STRING; break;
-    case IVI_ERROR_SYS_RSRC_ALLOC: code = HSDIG_ERROR_INTERNAL; break;
-    default: break;
+    case IVI_ERROR_BAD_OPTION_VALUE:
+      code = HSDIG_ERROR_OPTION_STRING;
+      break;
+    case IVI_ERROR_SYS_RSRC_ALLOC:
+      code = HSDIG_ERROR_INTERNAL;
+      break;
+    default:
+      break;
   }
   fail(code, std::string(what), code == st ? 0 : st);
 }
@@ -112,7 +132,8 @@ Digitizer::Digitizer(ViSession v, const Model& m, std::string r)
   processing.resize(static_cast<size_t>(m.channels));
   equalization.resize(static_cast<size_t>(m.channels));
   auto put32 = [&](int offset, std::uint32_t value) {
-    for (int i = 0; i < 4; ++i) registers[static_cast<size_t>(offset + i)] = (value >> (8 * i)) & 0xFF;
+    for (int i = 0; i < 4; ++i)
+      registers[static_cast<size_t>(offset + i)] = (value >> (8 * i)) & 0xFF;
   };
   put32(HSDIG_REG_ID, 0x48534447u);
   put32(HSDIG_REG_REVISION, 0x00030201u);
@@ -120,7 +141,9 @@ Digitizer::Digitizer(ViSession v, const Model& m, std::string r)
 }
 
 // ---- Channels ----------------------------------------------------------------
-std::string channelName(int index) { return std::to_string(index); }
+std::string channelName(int index) {
+  return std::to_string(index);
+}
 
 namespace {
 std::string_view trimmed(std::string_view s) {
@@ -135,9 +158,10 @@ int channelIndex(const Digitizer& d, std::string_view name, std::string_view who
   auto [end, ec] = std::from_chars(name.data(), name.data() + name.size(), value);
   if (name.empty() || ec != std::errc() || end != name.data() + name.size() || value < 0 ||
       value >= d.model.channels) {
-    fail(HSDIG_ERROR_INVALID_CHANNEL,
-         "Channel \"" + std::string(name) + "\" in \"" + std::string(whole) + "\" is not a channel of the " +
-             d.model.name + " (channels 0 to " + std::to_string(d.model.channels - 1) + ").");
+    fail(HSDIG_ERROR_INVALID_CHANNEL, "Channel \"" + std::string(name) + "\" in \"" +
+                                          std::string(whole) + "\" is not a channel of the " +
+                                          d.model.name + " (channels 0 to " +
+                                          std::to_string(d.model.channels - 1) + ").");
   }
   return value;
 }
@@ -198,10 +222,10 @@ constexpr bool kScope_SESSION = false;
 const std::vector<AttributeInfo>& allAttributes() {
   static const std::vector<AttributeInfo> table = [] {
     std::vector<AttributeInfo> t;
-#define HSDIG_ROW(NAME, id, type, scope, def, mn, mx, flags)                                   \
-  {                                                                                            \
-    Default d(def);                                                                            \
-    t.push_back({id, #NAME, kType_##type, kScope_##scope, d.number, d.text ? d.text : "",      \
+#define HSDIG_ROW(NAME, id, type, scope, def, mn, mx, flags)                                       \
+  {                                                                                                \
+    Default d(def);                                                                                \
+    t.push_back({id, #NAME, kType_##type, kScope_##scope, d.number, d.text ? d.text : "",          \
                  static_cast<double>(mn), static_cast<double>(mx), (flags)&HSDIG_ATTR_READ_ONLY}); \
   }
     HSDIG_ATTRIBUTES(HSDIG_ROW)
@@ -250,8 +274,9 @@ std::string getString(ViSession vi, const char* ch, ViAttr id) {
   ViStatus size = Ivi_GetAttributeViString(vi, ch, id, 0, 0, nullptr);
   checkEngine(size, "Reading " + describe(id) + ".");
   std::string text(static_cast<size_t>(std::max<ViStatus>(size, 1)), '\0');
-  checkEngine(Ivi_GetAttributeViString(vi, ch, id, 0, static_cast<ViInt32>(text.size()), text.data()),
-              "Reading " + describe(id) + ".");
+  checkEngine(
+      Ivi_GetAttributeViString(vi, ch, id, 0, static_cast<ViInt32>(text.size()), text.data()),
+      "Reading " + describe(id) + ".");
   text.resize(std::strlen(text.c_str()));
   return text;
 }
@@ -269,7 +294,8 @@ void setInternalBoolean(ViSession vi, const char* ch, ViAttr id, bool value) {
               "Writing " + describe(id) + ".");
 }
 void setInternal(ViSession vi, const char* ch, ViAttr id, const std::string& value) {
-  checkEngine(Ivi_SetAttributeViString(vi, ch, id, 0, value.c_str()), "Writing " + describe(id) + ".");
+  checkEngine(Ivi_SetAttributeViString(vi, ch, id, 0, value.c_str()),
+              "Writing " + describe(id) + ".");
 }
 
 void defineAttributes(ViSession vi, const Model& model, const std::string& serial) {
@@ -283,27 +309,30 @@ void defineAttributes(ViSession vi, const Model& model, const std::string& seria
     ViStatus st = VI_SUCCESS;
     switch (a.type) {
       case IVI_VAL_INT32:
-        st = Ivi_AddAttributeViInt32(vi, a.id, name.c_str(), static_cast<ViInt32>(a.numericDefault), flags,
-                                     nullptr, nullptr, nullptr);
+        st = Ivi_AddAttributeViInt32(vi, a.id, name.c_str(), static_cast<ViInt32>(a.numericDefault),
+                                     flags, nullptr, nullptr, nullptr);
         break;
       case IVI_VAL_INT64:
-        st = Ivi_AddAttributeViInt64(vi, a.id, name.c_str(), static_cast<ViInt64>(a.numericDefault), flags,
-                                     nullptr, nullptr, nullptr);
+        st = Ivi_AddAttributeViInt64(vi, a.id, name.c_str(), static_cast<ViInt64>(a.numericDefault),
+                                     flags, nullptr, nullptr, nullptr);
         break;
       case IVI_VAL_REAL64:
-        st = Ivi_AddAttributeViReal64(vi, a.id, name.c_str(), a.numericDefault, flags, nullptr, nullptr,
-                                      nullptr, 0);
+        st = Ivi_AddAttributeViReal64(vi, a.id, name.c_str(), a.numericDefault, flags, nullptr,
+                                      nullptr, nullptr, 0);
         break;
       case IVI_VAL_BOOLEAN:
-        st = Ivi_AddAttributeViBoolean(vi, a.id, name.c_str(), a.numericDefault != 0 ? VI_TRUE : VI_FALSE,
-                                       flags, nullptr, nullptr);
+        st = Ivi_AddAttributeViBoolean(vi, a.id, name.c_str(),
+                                       a.numericDefault != 0 ? VI_TRUE : VI_FALSE, flags, nullptr,
+                                       nullptr);
         break;
       case IVI_VAL_SESSION:
-        st = Ivi_AddAttributeViSession(vi, a.id, name.c_str(), static_cast<ViSession>(a.numericDefault),
-                                       flags, nullptr, nullptr);
+        st = Ivi_AddAttributeViSession(vi, a.id, name.c_str(),
+                                       static_cast<ViSession>(a.numericDefault), flags, nullptr,
+                                       nullptr);
         break;
       case IVI_VAL_STRING:
-        st = Ivi_AddAttributeViString(vi, a.id, name.c_str(), a.stringDefault, flags, nullptr, nullptr);
+        st = Ivi_AddAttributeViString(vi, a.id, name.c_str(), a.stringDefault, flags, nullptr,
+                                      nullptr);
         break;
     }
     checkEngine(st, "Defining " + name + ".");

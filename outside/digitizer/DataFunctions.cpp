@@ -20,28 +20,49 @@ using namespace hsdig::sim;
 
 namespace {
 
-enum class Format { Real64, Binary8, Binary16, Binary32, ComplexReal64, ComplexBinary8, ComplexBinary16, ComplexBinary32 };
+enum class Format {
+  Real64,
+  Binary8,
+  Binary16,
+  Binary32,
+  ComplexReal64,
+  ComplexBinary8,
+  ComplexBinary16,
+  ComplexBinary32
+};
 
 Format formatOf(ViInt32 dataType) {
   switch (dataType) {
-    case HSDIG_VAL_BINARY8: return Format::Binary8;
-    case HSDIG_VAL_BINARY16: return Format::Binary16;
-    case HSDIG_VAL_BINARY32: return Format::Binary32;
-    case HSDIG_VAL_REAL64: return Format::Real64;
-    case HSDIG_VAL_COMPLEX_BINARY8: return Format::ComplexBinary8;
-    case HSDIG_VAL_COMPLEX_BINARY16: return Format::ComplexBinary16;
-    case HSDIG_VAL_COMPLEX_BINARY32: return Format::ComplexBinary32;
-    case HSDIG_VAL_COMPLEX_REAL64: return Format::ComplexReal64;
+    case HSDIG_VAL_BINARY8:
+      return Format::Binary8;
+    case HSDIG_VAL_BINARY16:
+      return Format::Binary16;
+    case HSDIG_VAL_BINARY32:
+      return Format::Binary32;
+    case HSDIG_VAL_REAL64:
+      return Format::Real64;
+    case HSDIG_VAL_COMPLEX_BINARY8:
+      return Format::ComplexBinary8;
+    case HSDIG_VAL_COMPLEX_BINARY16:
+      return Format::ComplexBinary16;
+    case HSDIG_VAL_COMPLEX_BINARY32:
+      return Format::ComplexBinary32;
+    case HSDIG_VAL_COMPLEX_REAL64:
+      return Format::ComplexReal64;
     default:
-      fail(HSDIG_ERROR_NOT_SUPPORTED, "The data type " + std::to_string(dataType) +
-                                          " is not a sample format (1, 2, 4, 8, 1000, 1001, 1002, 1003).");
+      fail(HSDIG_ERROR_NOT_SUPPORTED,
+           "The data type " + std::to_string(dataType) +
+               " is not a sample format (1, 2, 4, 8, 1000, 1001, 1002, 1003).");
   }
 }
 
 // Converts `n` codes into the format at `out` (element index `at`).
-void convert(Format f, const std::int16_t* codes, size_t n, void* out, size_t at, double gain, double offset) {
+void convert(Format f, const std::int16_t* codes, size_t n, void* out, size_t at, double gain,
+             double offset) {
   switch (f) {
-    case Format::Binary16: std::memcpy(static_cast<std::int16_t*>(out) + at, codes, n * sizeof(std::int16_t)); break;
+    case Format::Binary16:
+      std::memcpy(static_cast<std::int16_t*>(out) + at, codes, n * sizeof(std::int16_t));
+      break;
     case Format::Binary8: {
       auto* o = static_cast<std::int8_t*>(out) + at;
       for (size_t k = 0; k < n; ++k) o[k] = static_cast<std::int8_t>(codes[k] >> 8);
@@ -49,7 +70,8 @@ void convert(Format f, const std::int16_t* codes, size_t n, void* out, size_t at
     }
     case Format::Binary32: {
       auto* o = static_cast<std::int32_t*>(out) + at;
-      for (size_t k = 0; k < n; ++k) o[k] = static_cast<std::int32_t>(static_cast<std::uint32_t>(codes[k]) << 16);
+      for (size_t k = 0; k < n; ++k)
+        o[k] = static_cast<std::int32_t>(static_cast<std::uint32_t>(codes[k]) << 16);
       break;
     }
     case Format::Real64: {
@@ -96,36 +118,46 @@ void convert(Format f, const std::int16_t* codes, size_t n, void* out, size_t at
 double formatGain(Format f, double gain16) {
   switch (f) {
     case Format::Binary8:
-    case Format::ComplexBinary8: return gain16 * 256.0;
+    case Format::ComplexBinary8:
+      return gain16 * 256.0;
     case Format::Binary16:
-    case Format::ComplexBinary16: return gain16;
+    case Format::ComplexBinary16:
+      return gain16;
     case Format::Binary32:
-    case Format::ComplexBinary32: return gain16 / 65536.0;
-    default: return 1.0;
+    case Format::ComplexBinary32:
+      return gain16 / 65536.0;
+    default:
+      return 1.0;
   }
 }
-bool scaled(Format f) { return f == Format::Real64 || f == Format::ComplexReal64; }
+bool scaled(Format f) {
+  return f == Format::Real64 || f == Format::ComplexReal64;
+}
 
 std::vector<int> enabledChannels(const Digitizer& d, const Acquisition& a, ViConstString list) {
   std::vector<int> channels = parseChannelList(d, list);
   for (int c : channels) {
     if (!a.channels[static_cast<size_t>(c)].enabled) {
-      fail(HSDIG_ERROR_INVALID_CHANNEL, "Channel " + channelName(c) + " was disabled in this acquisition.");
+      fail(HSDIG_ERROR_INVALID_CHANNEL,
+           "Channel " + channelName(c) + " was disabled in this acquisition.");
     }
   }
   return channels;
 }
 
-ViStatus fetchInto(Digitizer& d, ViConstString list, double timeout, ViInt32 numSamples, Format format, void* wfm,
-                   hsdigWfmInfo* info, bool cached) {
+ViStatus fetchInto(Digitizer& d, ViConstString list, double timeout, ViInt32 numSamples,
+                   Format format, void* wfm, hsdigWfmInfo* info, bool cached) {
   parseChannelList(d, list);
   requirePointer(wfm, "wfm");
   requirePointer(info, "wfmInfo");
-  if (numSamples < -1) fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "numSamples " + std::to_string(numSamples) + " is below -1.");
+  if (numSamples < -1)
+    fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE,
+         "numSamples " + std::to_string(numSamples) + " is below -1.");
   std::shared_ptr<Acquisition> acq = cached ? d.cachedData() : d.waitForData(timeout);
   const Acquisition& a = *acq;
   std::vector<int> channels = enabledChannels(d, a, list);
-  const size_t n = numSamples == -1 ? static_cast<size_t>(a.recordLength) : static_cast<size_t>(numSamples);
+  const size_t n =
+      numSamples == -1 ? static_cast<size_t>(a.recordLength) : static_cast<size_t>(numSamples);
   const ViInt32 relativeTo = getInt32(d.vi, "", HSDIG_ATTR_FETCH_RELATIVE_TO);
   const std::int64_t requested = getInt64(d.vi, "", HSDIG_ATTR_FETCH_OFFSET) +
                                  (relativeTo == HSDIG_VAL_TRIGGER_RELATIVE ? a.refIndex : 0);
@@ -137,13 +169,15 @@ ViStatus fetchInto(Digitizer& d, ViConstString list, double timeout, ViInt32 num
     const ChannelSetup& setup = a.channels[static_cast<size_t>(c)];
     const ChannelData& data = a.data[static_cast<size_t>(c)];
     for (std::int32_t r = 0; r < a.numRecords; ++r, ++index) {
-      const std::int16_t* codes = data.codes.data() + static_cast<size_t>(r) * static_cast<size_t>(a.recordLength) + start;
+      const std::int16_t* codes =
+          data.codes.data() + static_cast<size_t>(r) * static_cast<size_t>(a.recordLength) + start;
       convert(format, codes, actual, wfm, index * n, setup.gain(), setup.offset);
       clipped = clipped || data.clipped[static_cast<size_t>(r)];
       hsdigWfmInfo& w = info[index];
       w = hsdigWfmInfo{};
       w.xIncrement = 1.0 / a.sampleRate;
-      w.relativeInitialX = (static_cast<double>(start) - a.refIndex) / a.sampleRate + a.triggerDelay;
+      w.relativeInitialX =
+          (static_cast<double>(start) - a.refIndex) / a.sampleRate + a.triggerDelay;
       w.absoluteInitialX = a.triggerTimes[static_cast<size_t>(r)] + w.relativeInitialX;
       w.actualSamples = static_cast<ViInt32>(actual);
       w.gain = formatGain(format, setup.gain());
@@ -151,8 +185,9 @@ ViStatus fetchInto(Digitizer& d, ViConstString list, double timeout, ViInt32 num
     }
   }
   if (clipped) {
-    pendingWarningText() = "Some samples reached an edge of the vertical range and are clipped; widen the range "
-                           "or move the offset.";
+    pendingWarningText() =
+        "Some samples reached an edge of the vertical range and are clipped; widen the range "
+        "or move the offset.";
     return HSDIG_WARN_DATA_CLIPPED;
   }
   return VI_SUCCESS;
@@ -169,22 +204,26 @@ int singleChannel(const Digitizer& d, const Acquisition& a, ViConstString list) 
   std::vector<int> channels = enabledChannels(d, a, list);
   if (channels.size() * static_cast<size_t>(a.numRecords) != 1) {
     fail(HSDIG_ERROR_TOO_MANY_WAVEFORMS,
-         "\"" + std::string(list) + "\" with " + std::to_string(a.numRecords) + " record(s) gives " +
+         "\"" + std::string(list) + "\" with " + std::to_string(a.numRecords) +
+             " record(s) gives " +
              std::to_string(channels.size() * static_cast<size_t>(a.numRecords)) +
-             " waveforms; a scalar measurement returns one value, so name one channel of a one-record acquisition.");
+             " waveforms; a scalar measurement returns one value, so name one channel of a "
+             "one-record acquisition.");
   }
   return channels[0];
 }
 
 void checkScalar(ViInt32 function) {
   if (!isScalarFunction(function)) {
-    fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Scalar measurement function " + std::to_string(function) +
-                                             " is not one of HSDIG_MEAS_RISE_TIME (0) to HSDIG_MEAS_AMPLITUDE (15).");
+    fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE,
+         "Scalar measurement function " + std::to_string(function) +
+             " is not one of HSDIG_MEAS_RISE_TIME (0) to HSDIG_MEAS_AMPLITUDE (15).");
   }
 }
 
 // Measures and adds the value to the statistics once per acquisition.
-double measure(Digitizer& d, const Acquisition& a, int channel, ViInt32 function, MeasurementStats** statsOut = nullptr) {
+double measure(Digitizer& d, const Acquisition& a, int channel, ViInt32 function,
+               MeasurementStats** statsOut = nullptr) {
   const double value = scalarMeasurement(processedRecord(d, a, channel, 0), function);
   MeasurementStats& s = d.stats[{channel, function}];
   if (s.lastAcquisition != a.number) {
@@ -200,7 +239,8 @@ double measure(Digitizer& d, const Acquisition& a, int channel, ViInt32 function
   return value;
 }
 
-ViStatus fetchMeasurement(Digitizer& d, ViConstString list, double timeout, ViInt32 function, ViReal64* result) {
+ViStatus fetchMeasurement(Digitizer& d, ViConstString list, double timeout, ViInt32 function,
+                          ViReal64* result) {
   requirePointer(result, "result");
   checkScalar(function);
   parseChannelList(d, list);
@@ -213,12 +253,12 @@ ViStatus fetchMeasurement(Digitizer& d, ViConstString list, double timeout, ViIn
 
 extern "C" {
 
-#define HSDIG_FETCH(Function, T, format)                                                                    \
-  ViStatus hsdig_##Function(ViSession vi, ViConstString channelList, ViReal64 timeout, ViInt32 numSamples, T wfm[], \
-                            hsdigWfmInfo wfmInfo[]) {                                                       \
-    return callDriver(vi, "hsdig_" #Function, [&](Digitizer& d) {                                          \
-      return fetchInto(d, channelList, timeout, numSamples, format, wfm, wfmInfo, false);                  \
-    });                                                                                                     \
+#define HSDIG_FETCH(Function, T, format)                                                  \
+  ViStatus hsdig_##Function(ViSession vi, ViConstString channelList, ViReal64 timeout,    \
+                            ViInt32 numSamples, T wfm[], hsdigWfmInfo wfmInfo[]) {        \
+    return callDriver(vi, "hsdig_" #Function, [&](Digitizer& d) {                         \
+      return fetchInto(d, channelList, timeout, numSamples, format, wfm, wfmInfo, false); \
+    });                                                                                   \
   }
 HSDIG_FETCH(Fetch, ViReal64, Format::Real64)
 HSDIG_FETCH(FetchBinary8, ViInt8, Format::Binary8)
@@ -228,8 +268,8 @@ HSDIG_FETCH(FetchComplex, ViReal64, Format::ComplexReal64)
 HSDIG_FETCH(FetchComplexBinary16, ViInt16, Format::ComplexBinary16)
 #undef HSDIG_FETCH
 
-ViStatus hsdig_Read(ViSession vi, ViConstString channelList, ViReal64 timeout, ViInt32 numSamples, ViReal64 wfm[],
-                    hsdigWfmInfo wfmInfo[]) {
+ViStatus hsdig_Read(ViSession vi, ViConstString channelList, ViReal64 timeout, ViInt32 numSamples,
+                    ViReal64 wfm[], hsdigWfmInfo wfmInfo[]) {
   return callDriver(vi, "hsdig_Read", [&](Digitizer& d) {
     parseChannelList(d, channelList);
     requirePointer(wfm, "wfm");
@@ -239,22 +279,23 @@ ViStatus hsdig_Read(ViSession vi, ViConstString channelList, ViReal64 timeout, V
   });
 }
 
-ViStatus hsdig_CachedFetch(ViSession vi, ViConstString channelList, ViInt32 numSamples, ViInt32 dataType, void* wfm,
-                           hsdigWfmInfo wfmInfo[]) {
+ViStatus hsdig_CachedFetch(ViSession vi, ViConstString channelList, ViInt32 numSamples,
+                           ViInt32 dataType, void* wfm, hsdigWfmInfo wfmInfo[]) {
   return callDriver(vi, "hsdig_CachedFetch", [&](Digitizer& d) {
     const Format format = formatOf(dataType);
     return fetchInto(d, channelList, 0, numSamples, format, wfm, wfmInfo, true);
   });
 }
 
-ViStatus hsdig_FetchMeasurement(ViSession vi, ViConstString channelList, ViReal64 timeout, ViInt32 scalarMeasFunction,
-                                ViReal64* result) {
-  return callDriver(vi, "hsdig_FetchMeasurement",
-                    [&](Digitizer& d) { return fetchMeasurement(d, channelList, timeout, scalarMeasFunction, result); });
+ViStatus hsdig_FetchMeasurement(ViSession vi, ViConstString channelList, ViReal64 timeout,
+                                ViInt32 scalarMeasFunction, ViReal64* result) {
+  return callDriver(vi, "hsdig_FetchMeasurement", [&](Digitizer& d) {
+    return fetchMeasurement(d, channelList, timeout, scalarMeasFunction, result);
+  });
 }
 
-ViStatus hsdig_ReadMeasurement(ViSession vi, ViConstString channelList, ViReal64 timeout, ViInt32 scalarMeasFunction,
-                               ViReal64* result) {
+ViStatus hsdig_ReadMeasurement(ViSession vi, ViConstString channelList, ViReal64 timeout,
+                               ViInt32 scalarMeasFunction, ViReal64* result) {
   return callDriver(vi, "hsdig_ReadMeasurement", [&](Digitizer& d) {
     requirePointer(result, "result");
     checkScalar(scalarMeasFunction);
@@ -264,8 +305,9 @@ ViStatus hsdig_ReadMeasurement(ViSession vi, ViConstString channelList, ViReal64
   });
 }
 
-ViStatus hsdig_FetchMeasurementStats(ViSession vi, ViConstString channelList, ViReal64 timeout, ViInt32 scalarMeasFunction,
-                                     ViReal64* result, ViReal64* mean, ViReal64* stdev, ViReal64* min, ViReal64* max,
+ViStatus hsdig_FetchMeasurementStats(ViSession vi, ViConstString channelList, ViReal64 timeout,
+                                     ViInt32 scalarMeasFunction, ViReal64* result, ViReal64* mean,
+                                     ViReal64* stdev, ViReal64* min, ViReal64* max,
                                      ViInt32* numInStats) {
   return callDriver(vi, "hsdig_FetchMeasurementStats", [&](Digitizer& d) {
     checkScalar(scalarMeasFunction);
@@ -285,7 +327,8 @@ ViStatus hsdig_FetchMeasurementStats(ViSession vi, ViConstString channelList, Vi
   });
 }
 
-ViStatus hsdig_ClearWaveformMeasurementStats(ViSession vi, ViConstString channelList, ViInt32 clearableMeasurementFunction) {
+ViStatus hsdig_ClearWaveformMeasurementStats(ViSession vi, ViConstString channelList,
+                                             ViInt32 clearableMeasurementFunction) {
   return callDriver(vi, "hsdig_ClearWaveformMeasurementStats", [&](Digitizer& d) {
     std::vector<int> channels;
     if (!channelList || std::string(channelList).find_first_not_of(" \t") == std::string::npos) {
@@ -293,9 +336,11 @@ ViStatus hsdig_ClearWaveformMeasurementStats(ViSession vi, ViConstString channel
     } else {
       channels = parseChannelList(d, channelList);
     }
-    if (clearableMeasurementFunction != HSDIG_MEAS_ALL_MEASUREMENTS) checkScalar(clearableMeasurementFunction);
+    if (clearableMeasurementFunction != HSDIG_MEAS_ALL_MEASUREMENTS)
+      checkScalar(clearableMeasurementFunction);
     for (auto it = d.stats.begin(); it != d.stats.end();) {
-      const bool channelMatches = std::find(channels.begin(), channels.end(), it->first.first) != channels.end();
+      const bool channelMatches =
+          std::find(channels.begin(), channels.end(), it->first.first) != channels.end();
       const bool functionMatches = clearableMeasurementFunction == HSDIG_MEAS_ALL_MEASUREMENTS ||
                                    it->first.second == clearableMeasurementFunction;
       it = channelMatches && functionMatches ? d.stats.erase(it) : std::next(it);
@@ -304,21 +349,27 @@ ViStatus hsdig_ClearWaveformMeasurementStats(ViSession vi, ViConstString channel
   });
 }
 
-ViStatus hsdig_FetchArrayMeasurement(ViSession vi, ViConstString channelList, ViReal64 timeout, ViInt32 arrayMeasFunction,
-                                     ViInt32 measWfmSize, ViReal64 measWfm[], hsdigWfmInfo wfmInfo[]) {
+ViStatus hsdig_FetchArrayMeasurement(ViSession vi, ViConstString channelList, ViReal64 timeout,
+                                     ViInt32 arrayMeasFunction, ViInt32 measWfmSize,
+                                     ViReal64 measWfm[], hsdigWfmInfo wfmInfo[]) {
   return callDriver(vi, "hsdig_FetchArrayMeasurement", [&](Digitizer& d) {
     parseChannelList(d, channelList);
     requirePointer(measWfm, "measWfm");
     requirePointer(wfmInfo, "wfmInfo");
     if (!isArrayFunction(arrayMeasFunction)) {
-      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Array measurement function " + std::to_string(arrayMeasFunction) +
+      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Array measurement function " +
+                                               std::to_string(arrayMeasFunction) +
                                                " is not one of 1000 to 1008.");
     }
-    if (measWfmSize < -1) fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "measWfmSize " + std::to_string(measWfmSize) + " is below -1.");
+    if (measWfmSize < -1)
+      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE,
+           "measWfmSize " + std::to_string(measWfmSize) + " is below -1.");
     auto a = d.waitForData(timeout);
     std::vector<int> channels = enabledChannels(d, *a, channelList);
-    const size_t room = measWfmSize == -1 ? static_cast<size_t>(arrayMeasurementSize(a->recordLength, arrayMeasFunction))
-                                          : static_cast<size_t>(measWfmSize);
+    const size_t room =
+        measWfmSize == -1
+            ? static_cast<size_t>(arrayMeasurementSize(a->recordLength, arrayMeasFunction))
+            : static_cast<size_t>(measWfmSize);
     size_t index = 0;
     for (int c : channels) {
       for (std::int32_t r = 0; r < a->numRecords; ++r, ++index) {

@@ -29,10 +29,10 @@ using Clock = std::chrono::steady_clock;
 struct Model {
   const char* name;
   int channels;
-  int resolution;          // ADC bits; samples are 16-bit codes with the low bits zero
-  double maxSampleRate;    // samples per second
-  double bandwidth;        // hertz, first-order roll-off
-  std::int64_t memory;     // samples per channel (records x record length)
+  int resolution;        // ADC bits; samples are 16-bit codes with the low bits zero
+  double maxSampleRate;  // samples per second
+  double bandwidth;      // hertz, first-order roll-off
+  std::int64_t memory;   // samples per channel (records x record length)
 };
 // nullptr for an unknown name (compared without regard to case).
 const Model* findModel(std::string_view name);
@@ -81,7 +81,7 @@ struct ChannelSetup {
 };
 
 struct ChannelData {
-  std::vector<std::int16_t> codes;  // numRecords x recordLength
+  std::vector<std::int16_t> codes;    // numRecords x recordLength
   std::vector<std::uint8_t> clipped;  // per record
 };
 
@@ -125,12 +125,12 @@ class Digitizer {
   const Clock::time_point opened = Clock::now();
 
   AcqState state = AcqState::Idle;
-  std::shared_ptr<Acquisition> current;   // initiated, maybe complete
+  std::shared_ptr<Acquisition> current;  // initiated, maybe complete
   std::shared_ptr<Acquisition> lastComplete;
   std::uint64_t acquisitions = 0;
   std::array<std::uint8_t, HSDIG_REG_FILE_SIZE> registers{};
-  std::vector<std::vector<ViInt32>> processing;    // per channel
-  std::vector<std::vector<double>> equalization;   // per channel
+  std::vector<std::vector<ViInt32>> processing;           // per channel
+  std::vector<std::vector<double>> equalization;          // per channel
   std::map<std::pair<int, int>, MeasurementStats> stats;  // (channel, function)
   std::optional<std::string> savedConfiguration;
 

@@ -161,7 +161,8 @@ Trace scaledRecord(const Acquisition& a, int channel, int record) {
   const ChannelSetup& c = a.channels[static_cast<size_t>(channel)];
   Trace t;
   t.y.resize(static_cast<size_t>(a.recordLength));
-  const std::int16_t* codes = d.codes.data() + static_cast<size_t>(record) * static_cast<size_t>(a.recordLength);
+  const std::int16_t* codes =
+      d.codes.data() + static_cast<size_t>(record) * static_cast<size_t>(a.recordLength);
   const double gain = c.gain();
   for (size_t k = 0; k < t.y.size(); ++k) t.y[k] = codes[k] * gain + c.offset;
   t.dx = 1.0 / a.sampleRate;
@@ -169,8 +170,12 @@ Trace scaledRecord(const Acquisition& a, int channel, int record) {
   return t;
 }
 
-bool isScalarFunction(ViInt32 f) { return f >= HSDIG_MEAS_RISE_TIME && f <= HSDIG_MEAS_AMPLITUDE; }
-bool isArrayFunction(ViInt32 f) { return f >= HSDIG_MEAS_ARRAY_NONE && f <= HSDIG_MEAS_FFT_AMP_SPECTRUM_DB; }
+bool isScalarFunction(ViInt32 f) {
+  return f >= HSDIG_MEAS_RISE_TIME && f <= HSDIG_MEAS_AMPLITUDE;
+}
+bool isArrayFunction(ViInt32 f) {
+  return f >= HSDIG_MEAS_ARRAY_NONE && f <= HSDIG_MEAS_FFT_AMP_SPECTRUM_DB;
+}
 
 double scalarMeasurement(const Trace& t, ViInt32 function) {
   const std::vector<double>& y = t.y;
@@ -182,13 +187,20 @@ double scalarMeasurement(const Trace& t, ViInt32 function) {
     return crossingsOf(y, l.low + 0.5 * amp, 0.1 * amp);
   };
   switch (function) {
-    case HSDIG_MEAS_VOLTAGE_MAX: return l.max;
-    case HSDIG_MEAS_VOLTAGE_MIN: return l.min;
-    case HSDIG_MEAS_VOLTAGE_PEAK_TO_PEAK: return l.max - l.min;
-    case HSDIG_MEAS_VOLTAGE_HIGH: return l.high;
-    case HSDIG_MEAS_VOLTAGE_LOW: return l.low;
-    case HSDIG_MEAS_AMPLITUDE: return amp;
-    case HSDIG_MEAS_VOLTAGE_AVERAGE: return std::accumulate(y.begin(), y.end(), 0.0) / static_cast<double>(y.size());
+    case HSDIG_MEAS_VOLTAGE_MAX:
+      return l.max;
+    case HSDIG_MEAS_VOLTAGE_MIN:
+      return l.min;
+    case HSDIG_MEAS_VOLTAGE_PEAK_TO_PEAK:
+      return l.max - l.min;
+    case HSDIG_MEAS_VOLTAGE_HIGH:
+      return l.high;
+    case HSDIG_MEAS_VOLTAGE_LOW:
+      return l.low;
+    case HSDIG_MEAS_AMPLITUDE:
+      return amp;
+    case HSDIG_MEAS_VOLTAGE_AVERAGE:
+      return std::accumulate(y.begin(), y.end(), 0.0) / static_cast<double>(y.size());
     case HSDIG_MEAS_VOLTAGE_RMS: {
       double s = 0;
       for (double v : y) s += v * v;
@@ -213,7 +225,8 @@ double scalarMeasurement(const Trace& t, ViInt32 function) {
     case HSDIG_MEAS_DUTY_CYCLE_POS:
     case HSDIG_MEAS_DUTY_CYCLE_NEG: {
       Crossings c = cycles();
-      const bool positive = function == HSDIG_MEAS_WIDTH_POS || function == HSDIG_MEAS_DUTY_CYCLE_POS;
+      const bool positive =
+          function == HSDIG_MEAS_WIDTH_POS || function == HSDIG_MEAS_DUTY_CYCLE_POS;
       const auto& from = positive ? c.rising : c.falling;
       const auto& to = positive ? c.falling : c.rising;
       double sum = 0;
@@ -231,14 +244,16 @@ double scalarMeasurement(const Trace& t, ViInt32 function) {
       return 100.0 * width / meanDifference(c.rising.size() >= 2 ? c.rising : c.falling);
     }
     default:
-      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE,
-           "Scalar measurement function " + std::to_string(function) + " is not one of HSDIG_MEAS_RISE_TIME (0) to "
-           "HSDIG_MEAS_AMPLITUDE (15).");
+      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Scalar measurement function " +
+                                               std::to_string(function) +
+                                               " is not one of HSDIG_MEAS_RISE_TIME (0) to "
+                                               "HSDIG_MEAS_AMPLITUDE (15).");
   }
 }
 
 std::int32_t arrayMeasurementSize(std::int32_t n, ViInt32 function) {
-  if (function == HSDIG_MEAS_FFT_AMP_SPECTRUM_VOLTS_RMS || function == HSDIG_MEAS_FFT_AMP_SPECTRUM_DB) {
+  if (function == HSDIG_MEAS_FFT_AMP_SPECTRUM_VOLTS_RMS ||
+      function == HSDIG_MEAS_FFT_AMP_SPECTRUM_DB) {
     return static_cast<std::int32_t>(paddedLength(n) / 2 + 1);
   }
   return n;
@@ -249,7 +264,8 @@ Trace arrayMeasurement(const Trace& in, ViInt32 function) {
   std::vector<double>& y = out.y;
   const size_t n = y.size();
   switch (function) {
-    case HSDIG_MEAS_ARRAY_NONE: break;
+    case HSDIG_MEAS_ARRAY_NONE:
+      break;
     case HSDIG_MEAS_ARRAY_NEGATE:
       for (double& v : y) v = -v;
       break;
@@ -290,14 +306,16 @@ Trace arrayMeasurement(const Trace& in, ViInt32 function) {
         // Peak amplitude 2|X|/N for k > 0, as RMS; the DC bin is its value.
         double mag = std::abs(a[k]) * norm;
         double rms = k == 0 ? mag : mag * std::sqrt(2.0);
-        y[k] = function == HSDIG_MEAS_FFT_AMP_SPECTRUM_DB ? 20.0 * std::log10(std::max(rms, 1e-15)) : rms;
+        y[k] = function == HSDIG_MEAS_FFT_AMP_SPECTRUM_DB ? 20.0 * std::log10(std::max(rms, 1e-15))
+                                                          : rms;
       }
       out.x0 = 0;
       out.dx = 1.0 / (in.dx * static_cast<double>(p));
       break;
     }
     default:
-      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Array measurement function " + std::to_string(function) +
+      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Array measurement function " +
+                                               std::to_string(function) +
                                                " is not one of HSDIG_MEAS_ARRAY_NONE (1000) to "
                                                "HSDIG_MEAS_FFT_AMP_SPECTRUM_DB (1008).");
   }

@@ -19,13 +19,14 @@ void put(ViInt32* out, ViInt32 value) {
 int oneChannel(const Digitizer& d, ViConstString channel) {
   std::vector<int> channels = parseChannelList(d, channel);
   if (channels.size() != 1) {
-    fail(HSDIG_ERROR_INVALID_CHANNEL, "\"" + std::string(channel) + "\" names more than one channel.");
+    fail(HSDIG_ERROR_INVALID_CHANNEL,
+         "\"" + std::string(channel) + "\" names more than one channel.");
   }
   return channels[0];
 }
 
-ViStatus coefficients(Digitizer& d, ViConstString list, ViInt32 bufferSize, hsdigCoefficientInfo* info,
-                      ViInt32* count, bool normalization) {
+ViStatus coefficients(Digitizer& d, ViConstString list, ViInt32 bufferSize,
+                      hsdigCoefficientInfo* info, ViInt32* count, bool normalization) {
   requirePointer(count, "numberOfCoefficientSets");
   std::vector<int> channels = parseChannelList(d, list);
   if (bufferSize < 0) fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "bufferSize is negative.");
@@ -61,7 +62,8 @@ ViStatus hsdig_ActualNumWfms(ViSession vi, ViConstString channelList, ViInt32* n
     requirePointer(numWfms, "numWfms");
     std::vector<int> channels = parseChannelList(d, channelList);
     d.update();
-    const ViInt32 records = d.current ? d.current->numRecords : getInt32(d.vi, "", HSDIG_ATTR_NUM_RECORDS);
+    const ViInt32 records =
+        d.current ? d.current->numRecords : getInt32(d.vi, "", HSDIG_ATTR_NUM_RECORDS);
     *numWfms = static_cast<ViInt32>(channels.size()) * records;
     return VI_SUCCESS;
   });
@@ -71,20 +73,24 @@ ViStatus hsdig_ActualRecordLength(ViSession vi, ViInt32* recordLength) {
   return callDriver(vi, "hsdig_ActualRecordLength", [&](Digitizer& d) {
     requirePointer(recordLength, "recordLength");
     d.update();
-    *recordLength = d.current ? d.current->recordLength : getInt32(d.vi, "", HSDIG_ATTR_RECORD_LENGTH);
+    *recordLength =
+        d.current ? d.current->recordLength : getInt32(d.vi, "", HSDIG_ATTR_RECORD_LENGTH);
     return VI_SUCCESS;
   });
 }
 
-ViStatus hsdig_ActualMeasWfmSize(ViSession vi, ViInt32 arrayMeasFunction, ViInt32* measWaveformSize) {
+ViStatus hsdig_ActualMeasWfmSize(ViSession vi, ViInt32 arrayMeasFunction,
+                                 ViInt32* measWaveformSize) {
   return callDriver(vi, "hsdig_ActualMeasWfmSize", [&](Digitizer& d) {
     requirePointer(measWaveformSize, "measWaveformSize");
     if (!isArrayFunction(arrayMeasFunction)) {
-      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Array measurement function " + std::to_string(arrayMeasFunction) +
+      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "Array measurement function " +
+                                               std::to_string(arrayMeasFunction) +
                                                " is not one of 1000 to 1008.");
     }
     d.update();
-    const ViInt32 length = d.current ? d.current->recordLength : getInt32(d.vi, "", HSDIG_ATTR_RECORD_LENGTH);
+    const ViInt32 length =
+        d.current ? d.current->recordLength : getInt32(d.vi, "", HSDIG_ATTR_RECORD_LENGTH);
     *measWaveformSize = arrayMeasurementSize(length, arrayMeasFunction);
     return VI_SUCCESS;
   });
@@ -141,7 +147,8 @@ ViStatus hsdig_ParseNumberOfChannels(ViSession vi, ViConstString channel, ViInt3
   });
 }
 
-ViStatus hsdig_GetChannelNameFromString(ViSession vi, ViConstString index, ViInt32 bufferSize, ViChar name[]) {
+ViStatus hsdig_GetChannelNameFromString(ViSession vi, ViConstString index, ViInt32 bufferSize,
+                                        ViChar name[]) {
   return callDriver(vi, "hsdig_GetChannelNameFromString", [&](Digitizer& d) {
     requirePointer(index, "index");
     // Indices count from 1 and take the channel-list forms: "1", "1,3", "1-4".
@@ -152,7 +159,8 @@ ViStatus hsdig_GetChannelNameFromString(ViSession vi, ViConstString index, ViInt
       if (number.empty()) return;
       long i = std::strtol(number.c_str(), nullptr, 10);
       if (i < 1 || i > d.model.channels) {
-        fail(HSDIG_ERROR_INVALID_CHANNEL, "Index " + number + " is not 1 to " + std::to_string(d.model.channels) + ".");
+        fail(HSDIG_ERROR_INVALID_CHANNEL,
+             "Index " + number + " is not 1 to " + std::to_string(d.model.channels) + ".");
       }
       shifted += std::to_string(i - 1);
       number.clear();
@@ -175,18 +183,20 @@ ViStatus hsdig_GetChannelNameFromString(ViSession vi, ViConstString index, ViInt
   });
 }
 
-ViStatus hsdig_GetStartTimestampInformation(ViSession vi, ViInt32* t1, ViInt32* t2, ViInt32* t3, ViInt32* t4,
-                                            ViReal64* deviceTime) {
+ViStatus hsdig_GetStartTimestampInformation(ViSession vi, ViInt32* t1, ViInt32* t2, ViInt32* t3,
+                                            ViInt32* t4, ViReal64* deviceTime) {
   return callDriver(vi, "hsdig_GetStartTimestampInformation", [&](Digitizer& d) {
     d.update();
     std::shared_ptr<Acquisition> a = d.current ? d.current : d.lastComplete;
-    if (!a) fail(HSDIG_ERROR_NO_ACQUISITION, "No acquisition has started, so it has no start time.");
+    if (!a)
+      fail(HSDIG_ERROR_NO_ACQUISITION, "No acquisition has started, so it has no start time.");
     // System time as a 128-bit fixed-point number of seconds since
     // 1970-01-01 UTC: T1:T2 the whole seconds, T3:T4 the fraction, most
     // significant word first.
     const std::uint64_t seconds = static_cast<std::uint64_t>(a->wallNanoseconds / 1000000000);
     const std::uint64_t nanos = static_cast<std::uint64_t>(a->wallNanoseconds % 1000000000);
-    const std::uint64_t fraction = static_cast<std::uint64_t>((static_cast<unsigned __int128>(nanos) << 64) / 1000000000u);
+    const std::uint64_t fraction =
+        static_cast<std::uint64_t>((static_cast<unsigned __int128>(nanos) << 64) / 1000000000u);
     put(t1, static_cast<ViInt32>(seconds >> 32));
     put(t2, static_cast<ViInt32>(seconds & 0xFFFFFFFFu));
     put(t3, static_cast<ViInt32>(fraction >> 32));
@@ -196,39 +206,46 @@ ViStatus hsdig_GetStartTimestampInformation(ViSession vi, ViInt32* t1, ViInt32* 
   });
 }
 
-ViStatus hsdig_GetStreamEndpointHandle(ViSession vi, ViConstString streamName, ViInt32* writerHandle) {
+ViStatus hsdig_GetStreamEndpointHandle(ViSession vi, ViConstString streamName,
+                                       ViInt32* writerHandle) {
   return callDriver(vi, "hsdig_GetStreamEndpointHandle", [&](Digitizer& d) {
     requirePointer(streamName, "streamName");
     requirePointer(writerHandle, "writerHandle");
     // One data stream per channel, "DataStream0" to "DataStream<N-1>".
     const std::string name = streamName;
     const std::string prefix = "DataStream";
-    if (name.compare(0, prefix.size(), prefix) != 0 || !isChannelName(d, name.substr(prefix.size()))) {
-      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "\"" + name + "\" is not a stream of the " + d.model.name +
-                                               " (\"DataStream0\" to \"DataStream" + std::to_string(d.model.channels - 1) +
-                                               "\").");
+    if (name.compare(0, prefix.size(), prefix) != 0 ||
+        !isChannelName(d, name.substr(prefix.size()))) {
+      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "\"" + name + "\" is not a stream of the " +
+                                               d.model.name + " (\"DataStream0\" to \"DataStream" +
+                                               std::to_string(d.model.channels - 1) + "\").");
     }
-    *writerHandle = static_cast<ViInt32>(0x10000 + (d.vi & 0xFFFF) * 16 + std::atoi(name.c_str() + prefix.size()));
+    *writerHandle = static_cast<ViInt32>(0x10000 + (d.vi & 0xFFFF) * 16 +
+                                         std::atoi(name.c_str() + prefix.size()));
     return VI_SUCCESS;
   });
 }
 
-ViStatus hsdig_GetEqualizationFilterCoefficients(ViSession vi, ViConstString channel, ViInt32 numberOfCoefficients,
+ViStatus hsdig_GetEqualizationFilterCoefficients(ViSession vi, ViConstString channel,
+                                                 ViInt32 numberOfCoefficients,
                                                  ViReal64 coefficients[]) {
   return callDriver(vi, "hsdig_GetEqualizationFilterCoefficients", [&](Digitizer& d) {
     int c = oneChannel(d, channel);
-    if (numberOfCoefficients < 0) fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "numberOfCoefficients is negative.");
+    if (numberOfCoefficients < 0)
+      fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "numberOfCoefficients is negative.");
     if (numberOfCoefficients > 0) requirePointer(coefficients, "coefficients");
     const std::vector<double>& stored = d.equalization[static_cast<size_t>(c)];
     for (ViInt32 i = 0; i < numberOfCoefficients; ++i) {
-      coefficients[i] = static_cast<size_t>(i) < stored.size() ? stored[static_cast<size_t>(i)] : 0.0;
+      coefficients[i] =
+          static_cast<size_t>(i) < stored.size() ? stored[static_cast<size_t>(i)] : 0.0;
     }
     return VI_SUCCESS;
   });
 }
 
-ViStatus hsdig_GetFrequencyResponse(ViSession vi, ViConstString channel, ViInt32 bufferSize, ViReal64 frequencies[],
-                                    ViReal64 amplitudes[], ViReal64 phases[], ViInt32* numberOfFrequencies) {
+ViStatus hsdig_GetFrequencyResponse(ViSession vi, ViConstString channel, ViInt32 bufferSize,
+                                    ViReal64 frequencies[], ViReal64 amplitudes[],
+                                    ViReal64 phases[], ViInt32* numberOfFrequencies) {
   return callDriver(vi, "hsdig_GetFrequencyResponse", [&](Digitizer& d) {
     int c = oneChannel(d, channel);
     if (bufferSize < 0) fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, "bufferSize is negative.");
@@ -255,14 +272,18 @@ ViStatus hsdig_GetFrequencyResponse(ViSession vi, ViConstString channel, ViInt32
 }
 
 ViStatus hsdig_GetScalingCoefficients(ViSession vi, ViConstString channelList, ViInt32 bufferSize,
-                                      hsdigCoefficientInfo coefficientInfo[], ViInt32* numberOfCoefficientSets) {
+                                      hsdigCoefficientInfo coefficientInfo[],
+                                      ViInt32* numberOfCoefficientSets) {
   return callDriver(vi, "hsdig_GetScalingCoefficients", [&](Digitizer& d) {
-    return coefficients(d, channelList, bufferSize, coefficientInfo, numberOfCoefficientSets, false);
+    return coefficients(d, channelList, bufferSize, coefficientInfo, numberOfCoefficientSets,
+                        false);
   });
 }
 
-ViStatus hsdig_GetNormalizationCoefficients(ViSession vi, ViConstString channelList, ViInt32 bufferSize,
-                                            hsdigCoefficientInfo coefficientInfo[], ViInt32* numberOfCoefficientSets) {
+ViStatus hsdig_GetNormalizationCoefficients(ViSession vi, ViConstString channelList,
+                                            ViInt32 bufferSize,
+                                            hsdigCoefficientInfo coefficientInfo[],
+                                            ViInt32* numberOfCoefficientSets) {
   return callDriver(vi, "hsdig_GetNormalizationCoefficients", [&](Digitizer& d) {
     return coefficients(d, channelList, bufferSize, coefficientInfo, numberOfCoefficientSets, true);
   });
@@ -284,7 +305,8 @@ ViStatus hsdig_self_test(ViSession vi, ViInt16* testResult, ViChar testMessage[2
     const bool registersOk = d.registers[0] == 0x47 && d.registers[3] == 0x48 &&
                              d.registers[HSDIG_REG_CHANNELS] == d.model.channels;
     if (testResult) *testResult = registersOk ? 0 : 1;
-    copyFixed(registersOk ? "Self test passed." : "Self test failed: the identification registers are wrong.",
+    copyFixed(registersOk ? "Self test passed."
+                          : "Self test failed: the identification registers are wrong.",
               testMessage);
     return VI_SUCCESS;
   });

@@ -39,7 +39,8 @@ Setup parseDriverSetup(const std::string& text) {
   size_t pos = 0;
   while (pos <= text.size()) {
     size_t end = text.find(';', pos);
-    std::string entry = trim(text.substr(pos, end == std::string::npos ? std::string::npos : end - pos));
+    std::string entry =
+        trim(text.substr(pos, end == std::string::npos ? std::string::npos : end - pos));
     pos = end == std::string::npos ? text.size() + 1 : end + 1;
     size_t colon = entry.find(':');
     if (colon == std::string::npos) continue;
@@ -49,8 +50,10 @@ Setup parseDriverSetup(const std::string& text) {
       s.model = findModel(value);
       if (!s.model) {
         std::string names;
-        for (const Model& m : allModels()) names += (names.empty() ? "" : ", ") + std::string(m.name);
-        fail(HSDIG_ERROR_INVALID_MODEL, "DriverSetup names model \"" + value + "\"; the models are " + names + ".");
+        for (const Model& m : allModels())
+          names += (names.empty() ? "" : ", ") + std::string(m.name);
+        fail(HSDIG_ERROR_INVALID_MODEL,
+             "DriverSetup names model \"" + value + "\"; the models are " + names + ".");
       }
     } else if (tag == "serial") {
       s.serial = value;
@@ -82,17 +85,20 @@ ViStatus hsdig_InitWithOptions(ViRsrc resourceName, ViBoolean idQuery, ViBoolean
     requirePointer(newVi, "newVi");
     *newVi = 0;
     requirePointer(resourceName, "resourceName");
-    checkEngine(Ivi_SpecificDriverNew("hsdig", optionString ? optionString : "", &vi), "Reading the option string.");
+    checkEngine(Ivi_SpecificDriverNew("hsdig", optionString ? optionString : "", &vi),
+                "Reading the option string.");
     std::string driverSetup = getString(vi, "", IVI_ATTR_DRIVER_SETUP);
     Setup setup = parseDriverSetup(driverSetup);
     setInternal(vi, "", IVI_ATTR_IO_RESOURCE_DESCRIPTOR, std::string(resourceName));
-    defineAttributes(vi, *setup.model, setup.serial.empty() ? serialFor(resourceName) : setup.serial);
+    defineAttributes(vi, *setup.model,
+                     setup.serial.empty() ? serialFor(resourceName) : setup.serial);
     auto d = std::make_unique<Digitizer>(vi, *setup.model, resourceName);
     addDigitizer(vi, std::move(d));
     *newVi = vi;
   } catch (const DriverError& e) {
     if (vi) Ivi_Dispose(vi);
-    Ivi_SetErrorInfo(0, VI_TRUE, e.code, e.secondary, ("hsdig_InitWithOptions: " + e.elaboration).c_str());
+    Ivi_SetErrorInfo(0, VI_TRUE, e.code, e.secondary,
+                     ("hsdig_InitWithOptions: " + e.elaboration).c_str());
     return e.code;
   } catch (...) {
     if (vi) Ivi_Dispose(vi);
@@ -106,7 +112,8 @@ ViStatus hsdig_InitWithOptions(ViRsrc resourceName, ViBoolean idQuery, ViBoolean
 ViStatus hsdig_close(ViSession vi) {
   ViBoolean locked = VI_FALSE;
   if (Ivi_LockSession(vi, &locked) < 0) {
-    recordStatus(0, HSDIG_ERROR_INVALID_SESSION, 0, "hsdig_close: session " + std::to_string(vi) + " is not open.");
+    recordStatus(0, HSDIG_ERROR_INVALID_SESSION, 0,
+                 "hsdig_close: session " + std::to_string(vi) + " is not open.");
     return HSDIG_ERROR_INVALID_SESSION;
   }
   try {

@@ -27,7 +27,8 @@ struct Change {
 // Validates every change for every channel first, then writes them as the
 // user's settings; so a rejected argument leaves the configuration as it was.
 // `channels` empty: session attributes.
-void applyChanges(Digitizer& d, const std::vector<int>& channels, const std::vector<Change>& changes);
+void applyChanges(Digitizer& d, const std::vector<int>& channels,
+                  const std::vector<Change>& changes);
 
 // Sources and terminals.
 bool isChannelName(const Digitizer& d, const std::string& s);

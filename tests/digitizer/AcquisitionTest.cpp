@@ -145,7 +145,8 @@ TEST_F(AcquisitionTest, MultiRecordFetchesFillOneTimingRecordPerWaveform) {
   }
   // Channel 0 runs at 1 MHz and channel 1 at 2 MHz by default.
   double differ = 0;
-  for (ViInt32 k = 0; k < wanted; ++k) differ += std::fabs(wfm[static_cast<size_t>(k)] - wfm[static_cast<size_t>(3 * wanted + k)]);
+  for (ViInt32 k = 0; k < wanted; ++k)
+    differ += std::fabs(wfm[static_cast<size_t>(k)] - wfm[static_cast<size_t>(3 * wanted + k)]);
   EXPECT_GT(differ, 1.0) << "channel 0 and channel 1 carry different signals";
 
   // A channel triggered acquisition shows the same part of the signal in
@@ -153,7 +154,8 @@ TEST_F(AcquisitionTest, MultiRecordFetchesFillOneTimingRecordPerWaveform) {
   ASSERT_EQ(hsdig_ConfigureTriggerEdge(vi, "0", 0.0, HSDIG_VAL_POSITIVE, 1, 0, 0), VI_SUCCESS);
   ASSERT_EQ(hsdig_Read(vi, "0", 5.0, wanted, wfm.data(), info.data()), VI_SUCCESS);
   for (ViInt32 k = 0; k < wanted; ++k) {
-    ASSERT_NEAR(wfm[static_cast<size_t>(k)], wfm[static_cast<size_t>(2 * wanted + k)], 2.0 / 65536 * 4);
+    ASSERT_NEAR(wfm[static_cast<size_t>(k)], wfm[static_cast<size_t>(2 * wanted + k)],
+                2.0 / 65536 * 4);
   }
   // The trigger point sits at the reference position, on a rising zero.
   EXPECT_LE(wfm[99], 0.0005);
@@ -163,7 +165,8 @@ TEST_F(AcquisitionTest, MultiRecordFetchesFillOneTimingRecordPerWaveform) {
 
 TEST_F(AcquisitionTest, SignalsFollowVerticalSettingsAndClip) {
   horizontal(100e6, 1000);
-  ASSERT_EQ(hsdig_SetAttributeViInt32(vi, "0", HSDIG_ATTR_SIGNAL_SHAPE, HSDIG_VAL_SHAPE_DC), VI_SUCCESS);
+  ASSERT_EQ(hsdig_SetAttributeViInt32(vi, "0", HSDIG_ATTR_SIGNAL_SHAPE, HSDIG_VAL_SHAPE_DC),
+            VI_SUCCESS);
   ASSERT_EQ(hsdig_SetAttributeViReal64(vi, "0", HSDIG_ATTR_SIGNAL_OFFSET, 0.3), VI_SUCCESS);
   struct Case {
     const char* what;
@@ -177,12 +180,15 @@ TEST_F(AcquisitionTest, SignalsFollowVerticalSettingsAndClip) {
       {"AC coupled removes DC", 1.0, 0.0, 1.0, HSDIG_VAL_AC, 0.0, VI_SUCCESS},
       {"ground", 1.0, 0.0, 1.0, HSDIG_VAL_GND, 0.0, VI_SUCCESS},
       {"probe x10", 10.0, 0.0, 10.0, HSDIG_VAL_DC, 3.0, VI_SUCCESS},
-      {"clipped at the top", 0.4, 0.0, 1.0, HSDIG_VAL_DC, 0.2 - 0.4 / 65536 * 4, HSDIG_WARN_DATA_CLIPPED},
+      {"clipped at the top", 0.4, 0.0, 1.0, HSDIG_VAL_DC, 0.2 - 0.4 / 65536 * 4,
+       HSDIG_WARN_DATA_CLIPPED},
       {"offset brings it back", 0.4, 0.25, 1.0, HSDIG_VAL_DC, 0.3, VI_SUCCESS},
   };
   for (const Case& c : cases) {
     SCOPED_TRACE(c.what);
-    ASSERT_EQ(hsdig_ConfigureVertical(vi, "0", c.range, c.offset, c.coupling, c.attenuation, VI_TRUE), VI_SUCCESS);
+    ASSERT_EQ(
+        hsdig_ConfigureVertical(vi, "0", c.range, c.offset, c.coupling, c.attenuation, VI_TRUE),
+        VI_SUCCESS);
     std::vector<double> wfm(1000);
     hsdigWfmInfo info{};
     EXPECT_EQ(hsdig_Read(vi, "0", 5.0, 1000, wfm.data(), &info), c.status);
@@ -198,17 +204,20 @@ TEST_F(AcquisitionTest, SignalsFollowVerticalSettingsAndClip) {
 TEST_F(AcquisitionTest, TimestampsAndDisabledChannels) {
   ViInt32 t[4] = {};
   ViReal64 device = -1;
-  EXPECT_EQ(hsdig_GetStartTimestampInformation(vi, &t[0], &t[1], &t[2], &t[3], &device), HSDIG_ERROR_NO_ACQUISITION);
+  EXPECT_EQ(hsdig_GetStartTimestampInformation(vi, &t[0], &t[1], &t[2], &t[3], &device),
+            HSDIG_ERROR_NO_ACQUISITION);
   takeError(vi);
   ASSERT_EQ(hsdig_SetAttributeViBoolean(vi, "3", HSDIG_ATTR_CHANNEL_ENABLED, VI_FALSE), VI_SUCCESS);
   ASSERT_EQ(hsdig_InitiateAcquisition(vi), VI_SUCCESS);
-  ASSERT_EQ(hsdig_GetStartTimestampInformation(vi, &t[0], &t[1], &t[2], &t[3], &device), VI_SUCCESS);
+  ASSERT_EQ(hsdig_GetStartTimestampInformation(vi, &t[0], &t[1], &t[2], &t[3], &device),
+            VI_SUCCESS);
   const std::uint64_t seconds = (std::uint64_t(std::uint32_t(t[0])) << 32) | std::uint32_t(t[1]);
   EXPECT_GT(seconds, 1600000000u) << "seconds since 1970";
   EXPECT_GE(device, 0.0);
   std::vector<double> wfm(2000);
   std::vector<hsdigWfmInfo> info(2);
-  EXPECT_EQ(hsdig_Fetch(vi, "2,3", 5.0, 1000, wfm.data(), info.data()), HSDIG_ERROR_INVALID_CHANNEL);
+  EXPECT_EQ(hsdig_Fetch(vi, "2,3", 5.0, 1000, wfm.data(), info.data()),
+            HSDIG_ERROR_INVALID_CHANNEL);
   ViInt32 state = 0;
   ASSERT_EQ(hsdig_GetSessionState(vi, "3", &state), VI_SUCCESS);
   EXPECT_EQ(state, HSDIG_VAL_STATE_DISABLED);

@@ -56,7 +56,9 @@ TEST(DigitizerThreads, ManyThreadsOnOneSessionKeepItConsistent) {
       hsdigWfmInfo info{};
       for (int r = 0; r < kRounds; ++r) {
         std::string ch = std::to_string(t);
-        if (hsdig_SetAttributeViReal64(vi, ch.c_str(), HSDIG_ATTR_SIGNAL_AMPLITUDE, 0.1 + 0.01 * r) != VI_SUCCESS) ++failures;
+        if (hsdig_SetAttributeViReal64(vi, ch.c_str(), HSDIG_ATTR_SIGNAL_AMPLITUDE,
+                                       0.1 + 0.01 * r) != VI_SUCCESS)
+          ++failures;
         if (hsdig_Read(vi, ch.c_str(), 5.0, 1000, wfm.data(), &info) != VI_SUCCESS) ++failures;
         if (info.actualSamples != 1000) ++failures;
       }

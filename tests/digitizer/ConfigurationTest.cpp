@@ -28,7 +28,8 @@ TEST_F(ConfigurationTest, EveryTypeRoundTrips) {
     EXPECT_EQ(v, -12345);
   }
   {
-    ASSERT_EQ(hsdig_SetAttributeViBoolean(vi, "2", HSDIG_ATTR_CHANNEL_ENABLED, VI_FALSE), VI_SUCCESS);
+    ASSERT_EQ(hsdig_SetAttributeViBoolean(vi, "2", HSDIG_ATTR_CHANNEL_ENABLED, VI_FALSE),
+              VI_SUCCESS);
     ViBoolean v = VI_TRUE;
     ASSERT_EQ(hsdig_GetAttributeViBoolean(vi, "2", HSDIG_ATTR_CHANNEL_ENABLED, &v), VI_SUCCESS);
     EXPECT_EQ(v, VI_FALSE);
@@ -40,7 +41,8 @@ TEST_F(ConfigurationTest, EveryTypeRoundTrips) {
     EXPECT_EQ(v, 77u);
   }
   {
-    ASSERT_EQ(hsdig_SetAttributeViString(vi, "3", HSDIG_ATTR_CHANNEL_LABEL, "probe on U7"), VI_SUCCESS);
+    ASSERT_EQ(hsdig_SetAttributeViString(vi, "3", HSDIG_ATTR_CHANNEL_LABEL, "probe on U7"),
+              VI_SUCCESS);
     EXPECT_EQ(text(HSDIG_ATTR_CHANNEL_LABEL, "3"), "probe on U7");
   }
 }
@@ -50,12 +52,14 @@ TEST_F(ConfigurationTest, ChannelListsNameOneOrSeveralChannels) {
     const char* list;
     std::vector<int> channels;
   };
-  const Case cases[] = {{"0", {0}}, {"0,1", {0, 1}}, {"0-3", {0, 1, 2, 3}}, {" 2 , 3 ", {2, 3}}, {"1:2", {1, 2}}};
+  const Case cases[] = {
+      {"0", {0}}, {"0,1", {0, 1}}, {"0-3", {0, 1, 2, 3}}, {" 2 , 3 ", {2, 3}}, {"1:2", {1, 2}}};
   double value = 0.5;
   for (const Case& c : cases) {
     SCOPED_TRACE(c.list);
     value += 0.25;
-    ASSERT_EQ(hsdig_ConfigureVertical(vi, c.list, value, 0.0, HSDIG_VAL_DC, 1.0, VI_TRUE), VI_SUCCESS);
+    ASSERT_EQ(hsdig_ConfigureVertical(vi, c.list, value, 0.0, HSDIG_VAL_DC, 1.0, VI_TRUE),
+              VI_SUCCESS);
     for (int ch = 0; ch < 4; ++ch) {
       bool named = std::find(c.channels.begin(), c.channels.end(), ch) != c.channels.end();
       if (named) {
@@ -68,7 +72,8 @@ TEST_F(ConfigurationTest, ChannelListsNameOneOrSeveralChannels) {
   }
   for (const char* bad : {"", "4", "0,0", "x", "0-9", "1,"}) {
     SCOPED_TRACE(bad);
-    EXPECT_EQ(hsdig_ConfigureVertical(vi, bad, 1.0, 0.0, HSDIG_VAL_DC, 1.0, VI_TRUE), HSDIG_ERROR_INVALID_CHANNEL);
+    EXPECT_EQ(hsdig_ConfigureVertical(vi, bad, 1.0, 0.0, HSDIG_VAL_DC, 1.0, VI_TRUE),
+              HSDIG_ERROR_INVALID_CHANNEL);
     EXPECT_EQ(takeError(vi).primary, HSDIG_ERROR_INVALID_CHANNEL);
   }
 }
@@ -85,12 +90,15 @@ TEST_F(ConfigurationTest, StringGettersFollowTheSizeProtocol) {
   char exact[9];
   EXPECT_EQ(hsdig_GetAttributeViString(vi, "0", HSDIG_ATTR_CHANNEL_LABEL, 9, exact), VI_SUCCESS);
   EXPECT_STREQ(exact, "abcdefgh");
-  EXPECT_EQ(hsdig_GetAttributeWithOptionsViString(vi, "", HSDIG_ATTR_MODEL, HSDIG_VAL_RETRIEVE_CURRENT, 0, nullptr), 6);
+  EXPECT_EQ(hsdig_GetAttributeWithOptionsViString(vi, "", HSDIG_ATTR_MODEL,
+                                                  HSDIG_VAL_RETRIEVE_CURRENT, 0, nullptr),
+            6);
   EXPECT_EQ(hsdig_GetChannelNameFromString(vi, "1-4", 0, nullptr), 8);
   char names[8];
   EXPECT_EQ(hsdig_GetChannelNameFromString(vi, "1-4", 8, names), VI_SUCCESS);
   EXPECT_STREQ(names, "0,1,2,3");
-  EXPECT_EQ(hsdig_GetAttributeViString(vi, "0", HSDIG_ATTR_CHANNEL_LABEL, 4, nullptr), HSDIG_ERROR_NULL_POINTER);
+  EXPECT_EQ(hsdig_GetAttributeViString(vi, "0", HSDIG_ATTR_CHANNEL_LABEL, 4, nullptr),
+            HSDIG_ERROR_NULL_POINTER);
 }
 
 TEST_F(ConfigurationTest, RetrievalModesGiveCurrentDefaultAndRange) {
@@ -99,15 +107,18 @@ TEST_F(ConfigurationTest, RetrievalModesGiveCurrentDefaultAndRange) {
     ViInt32 mode;
     double expected;
   };
-  for (const Case& c : {Case{HSDIG_VAL_RETRIEVE_CURRENT, 25.0}, Case{HSDIG_VAL_RETRIEVE_DEFAULT, 50.0},
-                        Case{HSDIG_VAL_RETRIEVE_MIN, 0.0}, Case{HSDIG_VAL_RETRIEVE_MAX, 100.0}}) {
+  for (const Case& c :
+       {Case{HSDIG_VAL_RETRIEVE_CURRENT, 25.0}, Case{HSDIG_VAL_RETRIEVE_DEFAULT, 50.0},
+        Case{HSDIG_VAL_RETRIEVE_MIN, 0.0}, Case{HSDIG_VAL_RETRIEVE_MAX, 100.0}}) {
     SCOPED_TRACE(c.mode);
     ViReal64 v = -1;
-    ASSERT_EQ(hsdig_GetAttributeWithOptionsViReal64(vi, "", HSDIG_ATTR_REF_POSITION, c.mode, &v), VI_SUCCESS);
+    ASSERT_EQ(hsdig_GetAttributeWithOptionsViReal64(vi, "", HSDIG_ATTR_REF_POSITION, c.mode, &v),
+              VI_SUCCESS);
     EXPECT_EQ(v, c.expected);
   }
   ViInt32 i = 0;
-  EXPECT_EQ(hsdig_GetAttributeWithOptionsViInt32(vi, "", HSDIG_ATTR_RECORD_LENGTH, 9, &i), HSDIG_ERROR_VALUE_OUT_OF_RANGE);
+  EXPECT_EQ(hsdig_GetAttributeWithOptionsViInt32(vi, "", HSDIG_ATTR_RECORD_LENGTH, 9, &i),
+            HSDIG_ERROR_VALUE_OUT_OF_RANGE);
 }
 
 TEST_F(ConfigurationTest, ResetAndSetByUser) {
@@ -150,7 +161,8 @@ TEST(DigitizerModels, DriverSetupChoosesTheModelAndChannelCount) {
     ViSession vi = openSession(c.options);
     ASSERT_NE(vi, 0u);
     char model[16];
-    ASSERT_EQ(hsdig_GetAttributeViString(vi, "", HSDIG_ATTR_MODEL, sizeof model, model), VI_SUCCESS);
+    ASSERT_EQ(hsdig_GetAttributeViString(vi, "", HSDIG_ATTR_MODEL, sizeof model, model),
+              VI_SUCCESS);
     EXPECT_STREQ(model, c.model);
     ViInt32 count = 0;
     ASSERT_EQ(hsdig_GetAttributeViInt32(vi, "", IVI_ATTR_CHANNEL_COUNT, &count), VI_SUCCESS);
@@ -160,7 +172,8 @@ TEST(DigitizerModels, DriverSetupChoosesTheModelAndChannelCount) {
     EXPECT_EQ(hsdig_close(vi), VI_SUCCESS);
   }
   ViSession vi = 0;
-  EXPECT_EQ(hsdig_InitWithOptions(const_cast<ViRsrc>("SIM"), VI_FALSE, VI_FALSE, "DriverSetup=Model:XYZ", &vi),
+  EXPECT_EQ(hsdig_InitWithOptions(const_cast<ViRsrc>("SIM"), VI_FALSE, VI_FALSE,
+                                  "DriverSetup=Model:XYZ", &vi),
             HSDIG_ERROR_INVALID_MODEL);
   EXPECT_EQ(vi, 0u);
   EXPECT_EQ(takeError(0).primary, HSDIG_ERROR_INVALID_MODEL);
@@ -172,9 +185,11 @@ TEST(DigitizerModels, DriverSetupChoosesTheModelAndChannelCount) {
 void configure(ViSession vi) {
   ASSERT_EQ(hsdig_ConfigureVertical(vi, "0-1", 4.0, 0.5, HSDIG_VAL_AC, 10.0, VI_TRUE), VI_SUCCESS);
   ASSERT_EQ(hsdig_ConfigureHorizontalTiming(vi, 50e6, 2048, 10.0, 3, VI_FALSE), VI_SUCCESS);
-  ASSERT_EQ(hsdig_ConfigureTriggerEdge(vi, "1", 0.2, HSDIG_VAL_NEGATIVE, HSDIG_VAL_TRIGGER_COUPLING_AC, 1e-6, 2e-6),
+  ASSERT_EQ(hsdig_ConfigureTriggerEdge(vi, "1", 0.2, HSDIG_VAL_NEGATIVE,
+                                       HSDIG_VAL_TRIGGER_COUPLING_AC, 1e-6, 2e-6),
             VI_SUCCESS);
-  ASSERT_EQ(hsdig_SetAttributeViString(vi, "2", HSDIG_ATTR_CHANNEL_LABEL, "with spaces, commas\nand a newline"),
+  ASSERT_EQ(hsdig_SetAttributeViString(vi, "2", HSDIG_ATTR_CHANNEL_LABEL,
+                                       "with spaces, commas\nand a newline"),
             VI_SUCCESS);
   ASSERT_EQ(hsdig_SetAttributeViInt64(vi, "", HSDIG_ATTR_FETCH_OFFSET, 17), VI_SUCCESS);
 }
@@ -203,7 +218,8 @@ class ExportImportTest : public DigitizerTest {
     ViStatus size = hsdig_ExportAttributeConfigurationBuffer(vi, 0, nullptr);
     EXPECT_GT(size, 0);
     std::vector<ViInt8> buffer(static_cast<size_t>(size));
-    EXPECT_EQ(hsdig_ExportAttributeConfigurationBuffer(vi, size - 1, buffer.data()), HSDIG_ERROR_BUFFER_TOO_SMALL);
+    EXPECT_EQ(hsdig_ExportAttributeConfigurationBuffer(vi, size - 1, buffer.data()),
+              HSDIG_ERROR_BUFFER_TOO_SMALL);
     takeError(vi);
     EXPECT_EQ(hsdig_ExportAttributeConfigurationBuffer(vi, size, buffer.data()), VI_SUCCESS);
     return buffer;
@@ -215,10 +231,13 @@ TEST_F(ExportImportTest, ImportOfAnExportRestoresTheConfiguration) {
   std::vector<ViInt8> buffer = exportBuffer();
   ASSERT_EQ(hsdig_reset(vi), VI_SUCCESS);
   expectDefaults();
-  ASSERT_EQ(hsdig_ImportAttributeConfigurationBuffer(vi, static_cast<ViInt32>(buffer.size()), buffer.data()), VI_SUCCESS);
+  ASSERT_EQ(hsdig_ImportAttributeConfigurationBuffer(vi, static_cast<ViInt32>(buffer.size()),
+                                                     buffer.data()),
+            VI_SUCCESS);
   expectConfigured();
 
-  const std::string path = ::testing::TempDir() + "hsdig_config_" + std::to_string(::getpid()) + ".txt";
+  const std::string path =
+      ::testing::TempDir() + "hsdig_config_" + std::to_string(::getpid()) + ".txt";
   ASSERT_EQ(hsdig_ExportAttributeConfigurationFile(vi, path.c_str()), VI_SUCCESS);
   ASSERT_EQ(hsdig_ResetAllAttributes(vi), VI_SUCCESS);
   ASSERT_EQ(hsdig_ImportAttributeConfigurationFile(vi, path.c_str()), VI_SUCCESS);
@@ -272,16 +291,18 @@ TEST_F(ExportImportTest, ADamagedImportFailsCleanlyAndChangesNothing) {
   };
   for (const Case& c : cases) {
     SCOPED_TRACE(c.what);
-    EXPECT_EQ(hsdig_ImportAttributeConfigurationBuffer(vi, static_cast<ViInt32>(c.data.size()),
-                                                       reinterpret_cast<const ViInt8*>(c.data.data())),
-              HSDIG_ERROR_CONFIGURATION_DATA);
+    EXPECT_EQ(
+        hsdig_ImportAttributeConfigurationBuffer(vi, static_cast<ViInt32>(c.data.size()),
+                                                 reinterpret_cast<const ViInt8*>(c.data.data())),
+        HSDIG_ERROR_CONFIGURATION_DATA);
     ErrorInfo e = takeError(vi);
     EXPECT_EQ(e.primary, HSDIG_ERROR_CONFIGURATION_DATA);
     EXPECT_FALSE(e.elaboration.empty());
     EXPECT_EQ(real(HSDIG_ATTR_VERTICAL_RANGE, "1"), 0.2);
     EXPECT_EQ(integer(HSDIG_ATTR_RECORD_LENGTH), 1000);
   }
-  EXPECT_EQ(hsdig_ImportAttributeConfigurationFile(vi, "/nonexistent/dir/config.txt"), HSDIG_ERROR_FILE_ACCESS);
+  EXPECT_EQ(hsdig_ImportAttributeConfigurationFile(vi, "/nonexistent/dir/config.txt"),
+            HSDIG_ERROR_FILE_ACCESS);
 }
 
 TEST_F(ConfigurationTest, RegistersCoefficientsAndQueries) {
@@ -330,18 +351,21 @@ TEST_F(ConfigurationTest, RegistersCoefficientsAndQueries) {
   ViInt32 handle = 0;
   ASSERT_EQ(hsdig_GetStreamEndpointHandle(vi, "DataStream3", &handle), VI_SUCCESS);
   EXPECT_NE(handle, 0);
-  EXPECT_EQ(hsdig_GetStreamEndpointHandle(vi, "DataStream4", &handle), HSDIG_ERROR_VALUE_OUT_OF_RANGE);
+  EXPECT_EQ(hsdig_GetStreamEndpointHandle(vi, "DataStream4", &handle),
+            HSDIG_ERROR_VALUE_OUT_OF_RANGE);
 
   ASSERT_EQ(hsdig_ExportSignal(vi, HSDIG_VAL_REF_TRIGGER, "", "PFI1"), VI_SUCCESS);
   EXPECT_EQ(text(HSDIG_ATTR_EXPORTED_REF_TRIGGER_TERMINAL), "PFI1");
-  EXPECT_EQ(hsdig_ExportSignal(vi, HSDIG_VAL_REF_TRIGGER, "", "Nowhere"), HSDIG_ERROR_INVALID_TRIGGER_SOURCE);
+  EXPECT_EQ(hsdig_ExportSignal(vi, HSDIG_VAL_REF_TRIGGER, "", "Nowhere"),
+            HSDIG_ERROR_INVALID_TRIGGER_SOURCE);
   ASSERT_EQ(hsdig_ConfigureClock(vi, "RefIn", "ClkOut", "SyncIn", VI_TRUE), VI_SUCCESS);
   EXPECT_EQ(text(HSDIG_ATTR_INPUT_CLOCK_SOURCE), "RefIn");
   ASSERT_EQ(hsdig_RequestPrivilege(vi, HSDIG_VAL_PRIVILEGE_OBSERVE), VI_SUCCESS);
   EXPECT_EQ(integer(HSDIG_ATTR_PRIVILEGE_LEVEL), 1);
   ASSERT_EQ(hsdig_ProbeCompensationSignalStart(vi), VI_SUCCESS);
   ViBoolean on = VI_FALSE;
-  ASSERT_EQ(hsdig_GetAttributeViBoolean(vi, "", HSDIG_ATTR_PROBE_COMPENSATION_ENABLED, &on), VI_SUCCESS);
+  ASSERT_EQ(hsdig_GetAttributeViBoolean(vi, "", HSDIG_ATTR_PROBE_COMPENSATION_ENABLED, &on),
+            VI_SUCCESS);
   EXPECT_EQ(on, VI_TRUE);
 }
 
@@ -352,19 +376,25 @@ TEST_F(ConfigurationTest, EveryTriggerKindIsConfigured) {
     ViInt32 type;
   };
   const Case cases[] = {
-      {"edge", hsdig_ConfigureTriggerEdge(vi, "0", 0.1, HSDIG_VAL_POSITIVE, 1, 0, 0), HSDIG_VAL_EDGE_TRIGGER},
-      {"hysteresis", hsdig_ConfigureTriggerHysteresis(vi, "1", 0.1, 0.05, HSDIG_VAL_POSITIVE, 1, 0, 0),
+      {"edge", hsdig_ConfigureTriggerEdge(vi, "0", 0.1, HSDIG_VAL_POSITIVE, 1, 0, 0),
+       HSDIG_VAL_EDGE_TRIGGER},
+      {"hysteresis",
+       hsdig_ConfigureTriggerHysteresis(vi, "1", 0.1, 0.05, HSDIG_VAL_POSITIVE, 1, 0, 0),
        HSDIG_VAL_HYSTERESIS_TRIGGER},
-      {"window", hsdig_ConfigureTriggerWindow(vi, "External", -0.1, 0.1, HSDIG_VAL_ENTERING_WINDOW, 1, 0, 0),
+      {"window",
+       hsdig_ConfigureTriggerWindow(vi, "External", -0.1, 0.1, HSDIG_VAL_ENTERING_WINDOW, 1, 0, 0),
        HSDIG_VAL_WINDOW_TRIGGER},
       {"width", hsdig_ConfigureTriggerWidth(vi, "0", 0.0, 1e-7, 1e-6, 0, HSDIG_VAL_WITHIN, 1, 0, 0),
        HSDIG_VAL_WIDTH_TRIGGER},
       {"runt", hsdig_ConfigureTriggerRunt(vi, "0", -0.1, 0.3, 0, 1, 0, 0), HSDIG_VAL_RUNT_TRIGGER},
       {"glitch", hsdig_ConfigureTriggerGlitch(vi, "0", 0.0, 1e-8, 0, HSDIG_VAL_LESS_THAN, 1, 0, 0),
        HSDIG_VAL_GLITCH_TRIGGER},
-      {"video", hsdig_ConfigureTriggerVideo(vi, "0", VI_TRUE, HSDIG_VAL_PAL, HSDIG_VAL_VIDEO_LINE_NUMBER, 600, 0, 1, 0, 0),
+      {"video",
+       hsdig_ConfigureTriggerVideo(vi, "0", VI_TRUE, HSDIG_VAL_PAL, HSDIG_VAL_VIDEO_LINE_NUMBER,
+                                   600, 0, 1, 0, 0),
        HSDIG_VAL_VIDEO_TRIGGER},
-      {"digital", hsdig_ConfigureTriggerDigital(vi, "PFI0", HSDIG_VAL_POSITIVE, 0, 0), HSDIG_VAL_DIGITAL_TRIGGER},
+      {"digital", hsdig_ConfigureTriggerDigital(vi, "PFI0", HSDIG_VAL_POSITIVE, 0, 0),
+       HSDIG_VAL_DIGITAL_TRIGGER},
       {"software", hsdig_ConfigureTriggerSoftware(vi, 0, 0), HSDIG_VAL_SOFTWARE_TRIGGER},
       {"immediate", hsdig_ConfigureTriggerImmediate(vi), HSDIG_VAL_IMMEDIATE_TRIGGER},
   };
@@ -375,10 +405,13 @@ TEST_F(ConfigurationTest, EveryTriggerKindIsConfigured) {
   ASSERT_EQ(hsdig_ConfigureTriggerRunt(vi, "0", -0.1, 0.3, 0, 1, 0, 0), VI_SUCCESS);
   EXPECT_EQ(integer(HSDIG_ATTR_TRIGGER_TYPE), HSDIG_VAL_RUNT_TRIGGER);
   EXPECT_EQ(real(HSDIG_ATTR_TRIGGER_HIGH_LEVEL), 0.3);
-  EXPECT_EQ(hsdig_ConfigureTriggerDigital(vi, "0", HSDIG_VAL_POSITIVE, 0, 0), HSDIG_ERROR_INVALID_TRIGGER_SOURCE);
-  EXPECT_EQ(hsdig_ConfigureTriggerVideo(vi, "0", VI_TRUE, HSDIG_VAL_NTSC, HSDIG_VAL_VIDEO_LINE_NUMBER, 600, 0, 1, 0, 0),
+  EXPECT_EQ(hsdig_ConfigureTriggerDigital(vi, "0", HSDIG_VAL_POSITIVE, 0, 0),
+            HSDIG_ERROR_INVALID_TRIGGER_SOURCE);
+  EXPECT_EQ(hsdig_ConfigureTriggerVideo(vi, "0", VI_TRUE, HSDIG_VAL_NTSC,
+                                        HSDIG_VAL_VIDEO_LINE_NUMBER, 600, 0, 1, 0, 0),
             HSDIG_ERROR_VALUE_OUT_OF_RANGE);
-  EXPECT_EQ(integer(HSDIG_ATTR_TRIGGER_TYPE), HSDIG_VAL_RUNT_TRIGGER) << "a refused configuration changes nothing";
+  EXPECT_EQ(integer(HSDIG_ATTR_TRIGGER_TYPE), HSDIG_VAL_RUNT_TRIGGER)
+      << "a refused configuration changes nothing";
 }
 
 }  // namespace

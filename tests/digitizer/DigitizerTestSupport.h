@@ -27,9 +27,11 @@ inline ErrorInfo takeError(ViSession vi) {
   return e;
 }
 
-inline ViSession openSession(const std::string& options = "", const char* resource = "SIM::DIGITIZER0") {
+inline ViSession openSession(const std::string& options = "",
+                             const char* resource = "SIM::DIGITIZER0") {
   ViSession vi = 0;
-  ViStatus st = hsdig_InitWithOptions(const_cast<ViRsrc>(resource), VI_TRUE, VI_FALSE, options.c_str(), &vi);
+  ViStatus st =
+      hsdig_InitWithOptions(const_cast<ViRsrc>(resource), VI_TRUE, VI_FALSE, options.c_str(), &vi);
   EXPECT_EQ(st, VI_SUCCESS) << takeError(0).elaboration;
   return vi;
 }
@@ -45,7 +47,8 @@ class DigitizerTest : public ::testing::Test {
   std::string text(ViAttr id, const char* channel = "") {
     ViStatus size = hsdig_GetAttributeViString(vi, channel, id, 0, nullptr);
     std::string s(static_cast<size_t>(size > 0 ? size : 1), '\0');
-    EXPECT_EQ(hsdig_GetAttributeViString(vi, channel, id, static_cast<ViInt32>(s.size()), s.data()), VI_SUCCESS);
+    EXPECT_EQ(hsdig_GetAttributeViString(vi, channel, id, static_cast<ViInt32>(s.size()), s.data()),
+              VI_SUCCESS);
     return s.c_str();
   }
   double real(ViAttr id, const char* channel = "") {
@@ -61,7 +64,8 @@ class DigitizerTest : public ::testing::Test {
   // One record of `length` samples at `rate` on every channel, immediate
   // trigger.
   void horizontal(double rate, ViInt32 length, ViInt32 records = 1, double refPosition = 0.0) {
-    ASSERT_EQ(hsdig_ConfigureHorizontalTiming(vi, rate, length, refPosition, records, VI_TRUE), VI_SUCCESS);
+    ASSERT_EQ(hsdig_ConfigureHorizontalTiming(vi, rate, length, refPosition, records, VI_TRUE),
+              VI_SUCCESS);
   }
   ViSession vi = 0;
 };

@@ -30,23 +30,28 @@ std::set<std::string> dynamicSymbols(const char* path) {
   ::close(fd);
   if (map == MAP_FAILED) throw std::runtime_error("cannot map the library");
   const auto* base = static_cast<const unsigned char*>(map);
-  auto fits = [&](size_t offset, size_t length) { return offset <= size && length <= size - offset; };
+  auto fits = [&](size_t offset, size_t length) {
+    return offset <= size && length <= size - offset;
+  };
   std::set<std::string> names;
   const auto* eh = reinterpret_cast<const Elf64_Ehdr*>(base);
   if (fits(0, sizeof(Elf64_Ehdr)) && std::memcmp(eh->e_ident, ELFMAG, SELFMAG) == 0 &&
-      eh->e_ident[EI_CLASS] == ELFCLASS64 && fits(eh->e_shoff, size_t(eh->e_shnum) * sizeof(Elf64_Shdr))) {
+      eh->e_ident[EI_CLASS] == ELFCLASS64 &&
+      fits(eh->e_shoff, size_t(eh->e_shnum) * sizeof(Elf64_Shdr))) {
     const auto* sh = reinterpret_cast<const Elf64_Shdr*>(base + eh->e_shoff);
     for (int i = 0; i < eh->e_shnum; ++i) {
       if (sh[i].sh_type != SHT_DYNSYM || sh[i].sh_link >= eh->e_shnum) continue;
       const Elf64_Shdr& strtab = sh[sh[i].sh_link];
-      if (!fits(sh[i].sh_offset, sh[i].sh_size) || !fits(strtab.sh_offset, strtab.sh_size)) continue;
+      if (!fits(sh[i].sh_offset, sh[i].sh_size) || !fits(strtab.sh_offset, strtab.sh_size))
+        continue;
       const auto* syms = reinterpret_cast<const Elf64_Sym*>(base + sh[i].sh_offset);
       const char* strings = reinterpret_cast<const char*>(base + strtab.sh_offset);
       for (size_t s = 1; s < sh[i].sh_size / sizeof(Elf64_Sym); ++s) {
         const Elf64_Sym& sym = syms[s];
         if (sym.st_shndx == SHN_UNDEF || ELF64_ST_VISIBILITY(sym.st_other) != STV_DEFAULT) continue;
         if (ELF64_ST_BIND(sym.st_info) == STB_LOCAL || sym.st_name >= strtab.sh_size) continue;
-        names.emplace(strings + sym.st_name, strnlen(strings + sym.st_name, strtab.sh_size - sym.st_name));
+        names.emplace(strings + sym.st_name,
+                      strnlen(strings + sym.st_name, strtab.sh_size - sym.st_name));
       }
     }
   }
@@ -91,7 +96,8 @@ TEST(DigitizerExports, AnUnknownSessionIsRefusedBeforeAnythingElse) {
   const Case cases[] = {
       {"hsdig_Abort", hsdig_Abort(kNoSession)},
       {"hsdig_ConfigureVertical", hsdig_ConfigureVertical(kNoSession, "0", 1, 0, 1, 1, 1)},
-      {"hsdig_GetAttributeViReal64", hsdig_GetAttributeViReal64(kNoSession, "0", HSDIG_ATTR_VERTICAL_RANGE, &value)},
+      {"hsdig_GetAttributeViReal64",
+       hsdig_GetAttributeViReal64(kNoSession, "0", HSDIG_ATTR_VERTICAL_RANGE, &value)},
       {"hsdig_Fetch", hsdig_Fetch(kNoSession, "0", 0, 1, &value, &info)},
       {"hsdig_close", hsdig_close(kNoSession)},
   };
