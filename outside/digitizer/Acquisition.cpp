@@ -372,6 +372,19 @@ void Digitizer::initiate() {
   update();
 }
 
+std::int32_t Digitizer::sizingRecords() {
+  update();
+  if (!current && !lastComplete) return getInt32(vi, "", HSDIG_ATTR_NUM_RECORDS);
+  return std::max(current ? current->numRecords : 0, lastComplete ? lastComplete->numRecords : 0);
+}
+
+std::int32_t Digitizer::sizingLength() {
+  update();
+  if (!current && !lastComplete) return getInt32(vi, "", HSDIG_ATTR_RECORD_LENGTH);
+  return std::max(current ? current->recordLength : 0,
+                  lastComplete ? lastComplete->recordLength : 0);
+}
+
 void Digitizer::abort() {
   update();
   if (state == AcqState::Acquiring) {

@@ -143,6 +143,12 @@ class Digitizer {
   // The acquisition a cached fetch reads: the current one when complete,
   // else the last complete one.
   std::shared_ptr<Acquisition> cachedData();
+  // What a caller sizes fetch buffers from: the largest record count and
+  // record length of the acquisitions a fetch or cached fetch may read (the
+  // current one and the last complete one), or the configuration when
+  // there is none. A buffer sized so holds whatever either writes.
+  std::int32_t sizingRecords();
+  std::int32_t sizingLength();
   void initiate();
   void commit();
   void abort();

@@ -61,10 +61,7 @@ ViStatus hsdig_ActualNumWfms(ViSession vi, ViConstString channelList, ViInt32* n
   return callDriver(vi, "hsdig_ActualNumWfms", [&](Digitizer& d) {
     requirePointer(numWfms, "numWfms");
     std::vector<int> channels = parseChannelList(d, channelList);
-    d.update();
-    const ViInt32 records =
-        d.current ? d.current->numRecords : getInt32(d.vi, "", HSDIG_ATTR_NUM_RECORDS);
-    *numWfms = static_cast<ViInt32>(channels.size()) * records;
+    *numWfms = static_cast<ViInt32>(channels.size()) * d.sizingRecords();
     return VI_SUCCESS;
   });
 }
@@ -72,9 +69,7 @@ ViStatus hsdig_ActualNumWfms(ViSession vi, ViConstString channelList, ViInt32* n
 ViStatus hsdig_ActualRecordLength(ViSession vi, ViInt32* recordLength) {
   return callDriver(vi, "hsdig_ActualRecordLength", [&](Digitizer& d) {
     requirePointer(recordLength, "recordLength");
-    d.update();
-    *recordLength =
-        d.current ? d.current->recordLength : getInt32(d.vi, "", HSDIG_ATTR_RECORD_LENGTH);
+    *recordLength = d.sizingLength();
     return VI_SUCCESS;
   });
 }
@@ -88,10 +83,7 @@ ViStatus hsdig_ActualMeasWfmSize(ViSession vi, ViInt32 arrayMeasFunction,
                                                std::to_string(arrayMeasFunction) +
                                                " is not one of 1000 to 1008.");
     }
-    d.update();
-    const ViInt32 length =
-        d.current ? d.current->recordLength : getInt32(d.vi, "", HSDIG_ATTR_RECORD_LENGTH);
-    *measWaveformSize = arrayMeasurementSize(length, arrayMeasFunction);
+    *measWaveformSize = arrayMeasurementSize(d.sizingLength(), arrayMeasFunction);
     return VI_SUCCESS;
   });
 }

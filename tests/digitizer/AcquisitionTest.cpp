@@ -225,3 +225,36 @@ TEST_F(AcquisitionTest, TimestampsAndDisabledChannels) {
 
 }  // namespace
 }  // namespace hsdig::test
+
+namespace hsdig::test {
+namespace {
+
+// A caller sizes a cached fetch from ActualNumWfms and ActualRecordLength
+// while a new, smaller acquisition is still waiting: the buffer must hold
+// what the cached (older, larger) acquisition writes.
+TEST_F(AcquisitionTest, SizesCoverTheCachedAcquisitionWhileANewOneWaits) {
+  horizontal(100e6, 300, 4);
+  ASSERT_EQ(hsdig_InitiateAcquisition(vi), VI_SUCCESS);
+  std::vector<double> first(1200);
+  std::vector<hsdigWfmInfo> firstInfo(4);
+  ASSERT_EQ(hsdig_Fetch(vi, "0", 5.0, 300, first.data(), firstInfo.data()), VI_SUCCESS);
+  horizontal(100e6, 100, 1);
+  ASSERT_EQ(hsdig_ConfigureTriggerSoftware(vi, 0, 0), VI_SUCCESS);
+  ASSERT_EQ(hsdig_InitiateAcquisition(vi), VI_SUCCESS);
+  ViInt32 wfms = 0, length = 0;
+  ASSERT_EQ(hsdig_ActualNumWfms(vi, "0", &wfms), VI_SUCCESS);
+  ASSERT_EQ(hsdig_ActualRecordLength(vi, &length), VI_SUCCESS);
+  EXPECT_EQ(wfms, 4);
+  EXPECT_EQ(length, 300);
+  std::vector<ViInt16> cached(static_cast<size_t>(wfms * length) + 1, 7);
+  std::vector<hsdigWfmInfo> info(static_cast<size_t>(wfms) + 1);
+  ASSERT_EQ(hsdig_CachedFetch(vi, "0", length, HSDIG_VAL_BINARY16, cached.data(), info.data()),
+            VI_SUCCESS);
+  EXPECT_EQ(cached.back(), 7);
+  EXPECT_EQ(info[3].actualSamples, 300);
+  EXPECT_EQ(info[4].actualSamples, 0);
+  EXPECT_NEAR(cached[5] * info[0].gain + info[0].offset, first[5], 1e-12);
+}
+
+}  // namespace
+}  // namespace hsdig::test
