@@ -142,6 +142,16 @@ void generateRecord(const Acquisition& a, const ChannelSetup& c, int channel, in
   clipped = clip ? 1 : 0;
 }
 
+// The channel index a trigger source names, or -1.
+int channelOf(const Digitizer& d, const std::string& source) {
+  if (source.empty() || source.size() > 3) return -1;
+  for (char c : source) {
+    if (c < '0' || c > '9') return -1;
+  }
+  const int channel = std::atoi(source.c_str());
+  return channel < d.model.channels ? channel : -1;
+}
+
 std::int64_t nanosecondsSince(Clock::time_point from) {
   return std::chrono::duration_cast<std::chrono::nanoseconds>(Clock::now() - from).count();
 }
@@ -179,11 +189,7 @@ void planTriggers(Digitizer& d, Acquisition& a, const std::string& source, doubl
   // A channel source triggers where its signal crosses the level with the
   // slope; every record then shows the same part of the signal. A source
   // whose signal never crosses the level never triggers.
-  int channel = -1;
-  if (!source.empty() && std::all_of(source.begin(), source.end(), ::isdigit)) {
-    channel = std::atoi(source.c_str());
-    if (channel >= d.model.channels) channel = -1;
-  }
+  const int channel = channelOf(d, source);
   if (channel >= 0) {
     const ChannelSetup& c = a.channels[static_cast<size_t>(channel)];
     if (c.frequency <= 0 || c.shape == HSDIG_VAL_SHAPE_DC || levelsOf(c).ac == 0) {
@@ -279,8 +285,7 @@ void Digitizer::commit() {
   const ViInt32 type = getInt32(vi, "", HSDIG_ATTR_TRIGGER_TYPE);
   if (type != HSDIG_VAL_IMMEDIATE_TRIGGER && type != HSDIG_VAL_SOFTWARE_TRIGGER) {
     std::string source = getString(vi, "", HSDIG_ATTR_TRIGGER_SOURCE);
-    bool channel = !source.empty() && std::all_of(source.begin(), source.end(), ::isdigit) &&
-                   std::atoi(source.c_str()) < model.channels;
+    bool channel = channelOf(*this, source) >= 0;
     bool external = source == "External" || source == "PFI0" || source == "PFI1";
     if (!channel && !external) {
       fail(HSDIG_ERROR_INVALID_TRIGGER_SOURCE, "The trigger source \"" + source +

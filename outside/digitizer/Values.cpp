@@ -122,9 +122,6 @@ void validateValue(const Digitizer& d, const AttributeInfo& a, const Value& v) {
     fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE,
          name + " = " + describeValue(v) + "; the inputs offer 50 or 1e6 ohms.");
   }
-  if (a.id == HSDIG_ATTR_VERTICAL_RANGE && x > 50.0 * 1000.0) {
-    fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE, name + " is too large.");
-  }
 }
 
 void writeValue(ViSession vi, const char* ch, ViAttr id, const Value& v, ViInt32 flags) {
