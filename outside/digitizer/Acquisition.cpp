@@ -69,18 +69,26 @@ struct Noise {
     s ^= s >> 27;
     return static_cast<double>((s * 0x2545F4914F6CDD1Dull) >> 11) * 0x1.0p-53;
   }
-  // Approximately normal, unit variance: the sum of four 16-bit uniforms
-  // taken from one draw (Irwin-Hall), cheap enough for every sample.
-  double normal() {
-    s ^= s >> 12;
-    s ^= s << 25;
-    s ^= s >> 27;
-    const std::uint64_t r = s * 0x2545F4914F6CDD1Dull;
-    const double sum =
-        static_cast<double>((r & 0xFFFF) + ((r >> 16) & 0xFFFF) + ((r >> 32) & 0xFFFF) + (r >> 48));
-    return (sum * (1.0 / 65536.0) - 2.0) * 1.7320508075688772;
-  }
 };
+
+// 65536 normal deviates (unit variance), made once; a record reads them
+// with its own start and odd stride, so noise differs between records,
+// channels and acquisitions and still costs one load per sample.
+const std::vector<float>& noiseTable() {
+  static const std::vector<float> table = [] {
+    std::vector<float> t(65536);
+    Noise n(12345);
+    for (size_t i = 0; i < t.size(); i += 2) {
+      // Box-Muller: two deviates from two uniforms.
+      const double u = std::max(n.uniform(), 1e-300), v = n.uniform();
+      const double r = std::sqrt(-2.0 * std::log(u));
+      t[i] = static_cast<float>(r * std::cos(2 * std::numbers::pi * v));
+      t[i + 1] = static_cast<float>(r * std::sin(2 * std::numbers::pi * v));
+    }
+    return t;
+  }();
+  return table;
+}
 
 void generateRecord(const Acquisition& a, const ChannelSetup& c, int channel, int record,
                     std::int16_t* out, std::uint8_t& clipped, int resolution) {
@@ -96,11 +104,32 @@ void generateRecord(const Acquisition& a, const ChannelSetup& c, int channel, in
   const double base = (lv.dc - c.offset) * invLsb;
   const double scale = lv.ac * invLsb;
   bool clip = false;
-  Noise noise(a.number * 1000003ull + static_cast<std::uint64_t>(channel) * 7919ull +
-              static_cast<std::uint64_t>(record));
+  Noise seed(a.number * 1000003ull + static_cast<std::uint64_t>(channel) * 7919ull +
+             static_cast<std::uint64_t>(record));
   const double noiseScale = c.noise * c.attenuation * invLsb;
+  const float* noise = noiseTable().data();
+  std::uint32_t noiseIndex = static_cast<std::uint32_t>(seed.uniform() * 65536.0) & 0xFFFF;
+  const std::uint32_t noiseStride =
+      (static_cast<std::uint32_t>(seed.uniform() * 65536.0) | 1) & 0xFFFF;
+  // A noise-free signal whose period is a whole number of samples repeats
+  // exactly: one period is computed and then copied over the record.
+  std::int32_t length = n;
+  if (noiseScale == 0) {
+    if (scale == 0) {
+      length = std::min<std::int32_t>(n, 1);
+    } else if (cyclesPerSample > 0) {
+      const double period = 1.0 / cyclesPerSample;
+      const double whole = std::round(period);
+      if (whole >= 1 && whole <= n / 2 && std::fabs(period - whole) <= 1e-9 * period) {
+        length = static_cast<std::int32_t>(whole);
+      }
+    }
+  }
   auto store = [&](std::int32_t k, double codeValue) {
-    if (noiseScale > 0) codeValue += noiseScale * noise.normal();
+    if (noiseScale > 0) {
+      codeValue += noiseScale * noise[noiseIndex];
+      noiseIndex = (noiseIndex + noiseStride) & 0xFFFF;
+    }
     // Rounds to the nearest code; the shift keeps the conversion's operand
     // positive, so truncation is rounding down (and needs no library call).
     std::int32_t q;
@@ -120,10 +149,10 @@ void generateRecord(const Acquisition& a, const ChannelSetup& c, int channel, in
     const double w = 2 * std::numbers::pi * cyclesPerSample;
     const double twoCos = 2 * std::cos(w);
     constexpr std::int32_t kBlock = 1024;
-    for (std::int32_t start = 0; start < n; start += kBlock) {
+    for (std::int32_t start = 0; start < length; start += kBlock) {
       const double theta = 2 * std::numbers::pi * fraction(p0 + start * cyclesPerSample);
       double prev = std::sin(theta - w), cur = std::sin(theta);
-      const std::int32_t end = std::min(n, start + kBlock);
+      const std::int32_t end = std::min(length, start + kBlock);
       for (std::int32_t k = start; k < end; ++k) {
         store(k, base + scale * cur);
         const double next = twoCos * cur - prev;
@@ -133,11 +162,16 @@ void generateRecord(const Acquisition& a, const ChannelSetup& c, int channel, in
     }
   } else {
     double p = p0;
-    for (std::int32_t k = 0; k < n; ++k) {
+    for (std::int32_t k = 0; k < length; ++k) {
       store(k, base + scale * shapeAt(c.shape, p, c.duty));
       p += cyclesPerSample;
       if (p >= 1.0) p -= std::floor(p);
     }
+  }
+  for (std::int32_t done = length; done < n;) {
+    const std::int32_t chunk = std::min(done, n - done);
+    std::memcpy(out + done, out, static_cast<size_t>(chunk) * sizeof(std::int16_t));
+    done += chunk;
   }
   clipped = clip ? 1 : 0;
 }
@@ -170,11 +204,11 @@ void materialize(Acquisition& a) {
   for (size_t c = 0; c < a.channels.size(); ++c) {
     if (!a.channels[c].enabled) continue;
     ChannelData& d = a.data[c];
-    d.codes.resize(perChannel);
+    d.codes.reset(new std::int16_t[perChannel]);
     d.clipped.assign(static_cast<size_t>(a.numRecords), 0);
     for (std::int32_t r = 0; r < a.numRecords; ++r) {
       generateRecord(a, a.channels[c], static_cast<int>(c), r,
-                     d.codes.data() + static_cast<size_t>(r) * static_cast<size_t>(a.recordLength),
+                     d.codes.get() + static_cast<size_t>(r) * static_cast<size_t>(a.recordLength),
                      d.clipped[static_cast<size_t>(r)], a.resolution);
     }
   }

@@ -170,7 +170,7 @@ ViStatus fetchInto(Digitizer& d, ViConstString list, double timeout, ViInt32 num
     const ChannelData& data = a.data[static_cast<size_t>(c)];
     for (std::int32_t r = 0; r < a.numRecords; ++r, ++index) {
       const std::int16_t* codes =
-          data.codes.data() + static_cast<size_t>(r) * static_cast<size_t>(a.recordLength) + start;
+          data.codes.get() + static_cast<size_t>(r) * static_cast<size_t>(a.recordLength) + start;
       convert(format, codes, actual, wfm, index * n, setup.gain(), setup.offset);
       clipped = clipped || data.clipped[static_cast<size_t>(r)];
       hsdigWfmInfo& w = info[index];

@@ -81,7 +81,9 @@ struct ChannelSetup {
 };
 
 struct ChannelData {
-  std::vector<std::int16_t> codes;    // numRecords x recordLength
+  // numRecords x recordLength codes. Left uninitialised on allocation: the
+  // generator writes every element before anything reads it.
+  std::unique_ptr<std::int16_t[]> codes;
   std::vector<std::uint8_t> clipped;  // per record
 };
 

@@ -162,7 +162,7 @@ Trace scaledRecord(const Acquisition& a, int channel, int record) {
   Trace t;
   t.y.resize(static_cast<size_t>(a.recordLength));
   const std::int16_t* codes =
-      d.codes.data() + static_cast<size_t>(record) * static_cast<size_t>(a.recordLength);
+      d.codes.get() + static_cast<size_t>(record) * static_cast<size_t>(a.recordLength);
   const double gain = c.gain();
   for (size_t k = 0; k < t.y.size(); ++k) t.y[k] = codes[k] * gain + c.offset;
   t.dx = 1.0 / a.sampleRate;
