@@ -6,9 +6,9 @@
 // the next one completes; CachedFetch reads it.
 //
 // The acquisition memory holds 16-bit codes (volts = code x range / 65536 +
-// offset) and is filled once, the first time the data of a complete
-// acquisition is needed, so every fetch format is a conversion of the same
-// codes.
+// offset) and is filled per channel, the first time a channel's data of a
+// complete acquisition is needed, so every fetch format is a conversion of
+// the same codes and channels nobody reads cost nothing.
 #include <algorithm>
 #include <cmath>
 #include <cstring>
@@ -197,22 +197,20 @@ double signalAt(const ChannelSetup& c, double cycles) {
   return lv.dc + lv.ac * shapeAt(c.shape, fraction(cycles), c.duty);
 }
 
-void materialize(Acquisition& a) {
-  if (a.materialized) return;
+void materialize(Acquisition& a, const std::vector<int>& channels) {
   const size_t perChannel = static_cast<size_t>(a.recordLength) * static_cast<size_t>(a.numRecords);
   a.data.resize(a.channels.size());
-  for (size_t c = 0; c < a.channels.size(); ++c) {
-    if (!a.channels[c].enabled) continue;
-    ChannelData& d = a.data[c];
+  for (int c : channels) {
+    ChannelData& d = a.data[static_cast<size_t>(c)];
+    if (d.codes || !a.channels[static_cast<size_t>(c)].enabled) continue;
     d.codes.reset(new std::int16_t[perChannel]);
     d.clipped.assign(static_cast<size_t>(a.numRecords), 0);
     for (std::int32_t r = 0; r < a.numRecords; ++r) {
-      generateRecord(a, a.channels[c], static_cast<int>(c), r,
+      generateRecord(a, a.channels[static_cast<size_t>(c)], c, r,
                      d.codes.get() + static_cast<size_t>(r) * static_cast<size_t>(a.recordLength),
                      d.clipped[static_cast<size_t>(r)], a.resolution);
     }
   }
-  a.materialized = true;
 }
 
 void planTriggers(Digitizer& d, Acquisition& a, const std::string& source, double level,
@@ -294,7 +292,6 @@ std::shared_ptr<Acquisition> Digitizer::waitForData(double timeout) {
     std::this_thread::sleep_until(current->completesAt);
     update();
   }
-  materialize(*current);
   return current;
 }
 
@@ -303,7 +300,6 @@ std::shared_ptr<Acquisition> Digitizer::cachedData() {
   std::shared_ptr<Acquisition> a = state == AcqState::Complete ? current : lastComplete;
   if (!a)
     fail(HSDIG_ERROR_NO_ACQUISITION, "No acquisition has completed yet, so nothing is cached.");
-  materialize(*a);
   return a;
 }
 

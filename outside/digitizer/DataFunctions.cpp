@@ -134,7 +134,7 @@ bool scaled(Format f) {
   return f == Format::Real64 || f == Format::ComplexReal64;
 }
 
-std::vector<int> enabledChannels(const Digitizer& d, const Acquisition& a, ViConstString list) {
+std::vector<int> enabledChannels(const Digitizer& d, Acquisition& a, ViConstString list) {
   std::vector<int> channels = parseChannelList(d, list);
   for (int c : channels) {
     if (!a.channels[static_cast<size_t>(c)].enabled) {
@@ -142,6 +142,7 @@ std::vector<int> enabledChannels(const Digitizer& d, const Acquisition& a, ViCon
            "Channel " + channelName(c) + " was disabled in this acquisition.");
     }
   }
+  materialize(a, channels);
   return channels;
 }
 
@@ -154,7 +155,7 @@ ViStatus fetchInto(Digitizer& d, ViConstString list, double timeout, ViInt32 num
     fail(HSDIG_ERROR_VALUE_OUT_OF_RANGE,
          "numSamples " + std::to_string(numSamples) + " is below -1.");
   std::shared_ptr<Acquisition> acq = cached ? d.cachedData() : d.waitForData(timeout);
-  const Acquisition& a = *acq;
+  Acquisition& a = *acq;
   std::vector<int> channels = enabledChannels(d, a, list);
   const size_t n =
       numSamples == -1 ? static_cast<size_t>(a.recordLength) : static_cast<size_t>(numSamples);
@@ -200,7 +201,7 @@ Trace processedRecord(const Digitizer& d, const Acquisition& a, int channel, int
 }
 
 // The one waveform a scalar measurement reads.
-int singleChannel(const Digitizer& d, const Acquisition& a, ViConstString list) {
+int singleChannel(const Digitizer& d, Acquisition& a, ViConstString list) {
   std::vector<int> channels = enabledChannels(d, a, list);
   if (channels.size() * static_cast<size_t>(a.numRecords) != 1) {
     fail(HSDIG_ERROR_TOO_MANY_WAVEFORMS,

@@ -107,8 +107,7 @@ struct Acquisition {
   Clock::time_point completesAt;
   std::int64_t startNanoseconds = 0;  // since the session opened
   std::int64_t wallNanoseconds = 0;   // system time at initiation
-  bool materialized = false;
-  std::vector<ChannelData> data;  // by channel; empty for disabled channels
+  std::vector<ChannelData> data;      // by channel; empty for disabled channels
 };
 
 struct MeasurementStats {
@@ -140,7 +139,7 @@ class Digitizer {
   void update();
   // Waits up to `timeout` seconds (negative: no limit) for the current
   // acquisition; fails with NO_ACQUISITION or FETCH_TIMEOUT. Returns the
-  // complete acquisition with its data materialized.
+  // complete acquisition; its data is filled by materialize.
   std::shared_ptr<Acquisition> waitForData(double timeout);
   // The acquisition a cached fetch reads: the current one when complete,
   // else the last complete one.
@@ -198,8 +197,9 @@ std::string exportConfiguration(Digitizer& d);
 void importConfiguration(Digitizer& d, std::string_view text);
 
 // ---- Signals ------------------------------------------------------------------
-// Fills the acquisition memory of every enabled channel.
-void materialize(Acquisition& a);
+// Fills the acquisition memory of the enabled channels named that are not
+// filled yet.
+void materialize(Acquisition& a, const std::vector<int>& channels);
 // Trigger times of the records, or sets neverTriggers.
 void planTriggers(Digitizer& d, Acquisition& a, const std::string& source, double level,
                   ViInt32 slope);
