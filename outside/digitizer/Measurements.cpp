@@ -297,6 +297,12 @@ Trace arrayMeasurement(const Trace& in, ViInt32 function) {
     case HSDIG_MEAS_FFT_AMP_SPECTRUM_VOLTS_RMS:
     case HSDIG_MEAS_FFT_AMP_SPECTRUM_DB: {
       const size_t p = paddedLength(static_cast<std::int32_t>(n));
+      // 16 bytes per padded point: larger spectra would take gigabytes.
+      if (p > (size_t(1) << 24)) {
+        fail(HSDIG_ERROR_NOT_SUPPORTED,
+             "Spectra are computed for records of up to 16777216 samples, not " +
+                 std::to_string(n) + ".");
+      }
       std::vector<std::complex<double>> a(p);
       for (size_t k = 0; k < n; ++k) a[k] = in.y[k];
       fft(a);
