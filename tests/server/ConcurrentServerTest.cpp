@@ -12,6 +12,7 @@
 #include "contract/Diagnostics.h"
 #include "hsdigEP_methods.h"
 #include "platform/Syscalls.h"
+#include "server/FrameBuilder.h"
 #include "server/ServerFixture.h"
 #include "server/hsdigEPConcurrentProcessor.h"
 #include "transport/TPipeServer.h"
@@ -21,42 +22,13 @@ namespace {
 
 using test::Client;
 using test::GateHandler;
+using test::resetFrame;
 
 // Waits until `condition` holds. No time limit: the test runner's own
 // time-out catches a condition that never comes.
 template <class Condition>
 void eventually(Condition condition) {
   while (!condition()) std::this_thread::sleep_for(std::chrono::milliseconds(1));
-}
-
-// One framed "reset" request, optionally padded by an unknown string field so
-// that the payload has exactly `payloadSize` bytes.
-std::string resetFrame(int32_t seqid, int32_t vi, uint32_t payloadSize = 0) {
-  auto build = [&](uint32_t padding) {
-    auto buffer = std::make_shared<apache::thrift::transport::TMemoryBuffer>();
-    auto out = contract::makeProtocolFactory()->getProtocol(buffer);
-    out->writeMessageBegin("reset", apache::thrift::protocol::T_CALL, seqid);
-    out->writeStructBegin("hsdigEP_reset_pargs");
-    out->writeFieldBegin("vi", apache::thrift::protocol::T_I32, 1);
-    out->writeI32(vi);
-    if (padding > 0) {
-      out->writeFieldBegin("pad", apache::thrift::protocol::T_STRING, 99);
-      out->writeString(std::string(padding, 'p'));
-    }
-    out->writeFieldStop();
-    out->writeStructEnd();
-    out->writeMessageEnd();
-    return buffer->getBufferAsString();
-  };
-  std::string payload = build(0);
-  if (payloadSize > payload.size()) {
-    // The padding field costs 7 bytes of header besides its content.
-    payload = build(payloadSize - static_cast<uint32_t>(payload.size()) - 7);
-  }
-  uint32_t n = static_cast<uint32_t>(payload.size());
-  std::string frame{static_cast<char>(n >> 24), static_cast<char>(n >> 16),
-                    static_cast<char>(n >> 8), static_cast<char>(n)};
-  return frame + payload;
 }
 
 std::mutex diagnosticsMutex;
