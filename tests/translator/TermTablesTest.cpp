@@ -6,15 +6,22 @@
 #include <lua.hpp>
 
 #include <algorithm>
+#include <cctype>
+#include <cstdio>
+#include <fstream>
 #include <map>
 #include <regex>
 #include <set>
+#include <sstream>
 #include <string>
 #include <vector>
 
+#include "driver/hsdigAttributes.h"
+#include "driver/hsdigErrors.h"
 #include "errors/translator/EmbeddedModules.h"
 #include "errors/translator/Translator.h"
 #include "errors/translator/TranslatorSession.h"
+#include "outside/ivi-engine/IviEngine.h"
 
 namespace hsdig::translator {
 namespace {
@@ -242,6 +249,185 @@ TEST_F(TermTables, EnglishCoversEveryCodeAndKeyThisSystemRaises) {
   // The DriverSetup messages are fixed texts.
   EXPECT_EQ(terms["kSidlSetupContainsEqual"], "DriverSetup string cannot contain a '='");
   EXPECT_EQ(terms["kSidlInvalidFileHandle"], "Invalid file handle.");
+}
+
+// The engine's status codes, as its public header defines them: every
+// "#define IVI_ERROR_... ((ViStatus)0x...)" but the base, plus the parameter
+// position range. Read from the header so that a code added there without a
+// text fails here.
+std::vector<int32_t> engineStatusCodes() {
+  std::ifstream in(HSDIG_SOURCE_DIR "/outside/ivi-engine/IviEngine.h");
+  std::stringstream text;
+  text << in.rdbuf();
+  std::string header = text.str();
+  std::vector<int32_t> codes;
+  std::regex define(R"(#define\s+(IVI_ERROR_\w+)\s+\(\(ViStatus\)0x([0-9A-Fa-f]{8})\))");
+  for (std::sregex_iterator it(header.begin(), header.end(), define), end; it != end; ++it) {
+    if ((*it)[1] == "IVI_ERROR_BASE") continue;
+    codes.push_back(ivi(static_cast<uint32_t>(std::stoul((*it)[2], nullptr, 16))));
+  }
+  for (int32_t code = IVI_ERROR_PARAMETER1; code <= IVI_ERROR_PARAMETER8; ++code) {
+    codes.push_back(code);
+  }
+  return codes;
+}
+
+TEST_F(TermTables, EnglishDescribesEveryCodeOfTheEngine) {
+  auto codes = engineStatusCodes();
+  // The scan found the header's codes, among them the first and the last.
+  ASSERT_GE(codes.size(), 36u);
+  EXPECT_NE(std::find(codes.begin(), codes.end(), IVI_ERROR_CANNOT_OPEN_FILE), codes.end());
+  EXPECT_NE(std::find(codes.begin(), codes.end(), IVI_ERROR_INVALID_SESSION_HANDLE), codes.end());
+  TranslatorSession session;
+  for (int32_t code : codes) {
+    SCOPED_TRACE(testing::Message() << std::hex << static_cast<uint32_t>(code));
+    bool known = false;
+    session.staticDescription(code, 0, &known);
+    EXPECT_TRUE(known);
+  }
+  // Each parameter position names its own parameter.
+  EXPECT_EQ(session.staticDescription(IVI_ERROR_PARAMETER1 + 2, 0),
+            "Parameter 3 of the function has an invalid value.");
+}
+
+TEST_F(TermTables, EnglishDescribesExactlyTheDriverStatusCodes) {
+  struct DriverCode {
+    const char* name;
+    int32_t code;
+  };
+#define HSDIG_TEST_CODE(NAME, code, text) {#NAME, ivi(code)},
+  const DriverCode driverCodes[] = {HSDIG_DRIVER_STATUS(HSDIG_TEST_CODE)};
+#undef HSDIG_TEST_CODE
+  TranslatorSession session;
+  std::set<int32_t> driverSet;
+  for (const auto& [name, code] : driverCodes) {
+    SCOPED_TRACE(name);
+    driverSet.insert(code);
+    bool known = false;
+    session.staticDescription(code, 0, &known);
+    EXPECT_TRUE(known);
+  }
+  // No text is left for a code the driver no longer has: the driver's blocks
+  // hold only its own codes.
+  for (const auto& [key, text] : entriesOf(L, "errors_eng")) {
+    uint32_t code = static_cast<uint32_t>(std::stoll(key));
+    bool inDriverBlock = (code & 0x7FFFFF00u) == 0x3FFA5000u;
+    if (inDriverBlock) {
+      EXPECT_TRUE(driverSet.count(ivi(code))) << std::hex << code << " is not a driver code";
+    }
+  }
+}
+
+TEST_F(TermTables, DigitizerAttributesHaveTheirShortNamesAndValueNames) {
+  auto entries = entriesOf(L, "hsdig_attributes_eng");
+  auto keyOf = [](uint32_t id) {
+    char key[9];
+    std::snprintf(key, sizeof key, "%08X", id);
+    return std::string(key);
+  };
+  auto textOf = [&entries](const std::string& key) {
+    auto found = entries.find(key);
+    return found == entries.end() ? std::string("(missing)") : found->second;
+  };
+
+  struct Attribute {
+    const char* name;
+    uint32_t id;
+  };
+#define HSDIG_TEST_ATTRIBUTE(NAME, id, type, scope, def, min, max, flags) {#NAME, id},
+  const Attribute attributes[] = {HSDIG_ATTRIBUTES(HSDIG_TEST_ATTRIBUTE)};
+#undef HSDIG_TEST_ATTRIBUTE
+  std::set<std::string> driverKeys;
+  for (const auto& [name, id] : attributes) {
+    SCOPED_TRACE(name);
+    driverKeys.insert(keyOf(id));
+    EXPECT_EQ(textOf(keyOf(id)), name);
+  }
+
+  // The enumerated attributes and the constants of their values.
+  struct Value {
+    uint32_t attribute;
+    int value;
+    const char* name;
+  };
+#define HSDIG_TEST_VALUE(ATTR, NAME) \
+  { HSDIG_ATTR_##ATTR, HSDIG_VAL_##NAME, #NAME }
+  const Value values[] = {
+      HSDIG_TEST_VALUE(VERTICAL_COUPLING, AC),
+      HSDIG_TEST_VALUE(VERTICAL_COUPLING, DC),
+      HSDIG_TEST_VALUE(VERTICAL_COUPLING, GND),
+      HSDIG_TEST_VALUE(SIGNAL_SHAPE, SHAPE_DC),
+      HSDIG_TEST_VALUE(SIGNAL_SHAPE, SHAPE_SINE),
+      HSDIG_TEST_VALUE(SIGNAL_SHAPE, SHAPE_SQUARE),
+      HSDIG_TEST_VALUE(SIGNAL_SHAPE, SHAPE_TRIANGLE),
+      HSDIG_TEST_VALUE(SIGNAL_SHAPE, SHAPE_SAWTOOTH),
+      HSDIG_TEST_VALUE(ACQUISITION_TYPE, NORMAL),
+      HSDIG_TEST_VALUE(ACQUISITION_TYPE, FLEXRES),
+      HSDIG_TEST_VALUE(ACQUISITION_TYPE, DDC),
+      HSDIG_TEST_VALUE(SAMPLE_MODE, REAL_TIME),
+      HSDIG_TEST_VALUE(SAMPLE_MODE, EQUIVALENT_TIME),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, EDGE_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, HYSTERESIS_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, DIGITAL_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, WINDOW_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, SOFTWARE_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, IMMEDIATE_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, WIDTH_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, RUNT_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, GLITCH_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_TYPE, VIDEO_TRIGGER),
+      HSDIG_TEST_VALUE(TRIGGER_SLOPE, NEGATIVE),
+      HSDIG_TEST_VALUE(TRIGGER_SLOPE, POSITIVE),
+      HSDIG_TEST_VALUE(TRIGGER_COUPLING, TRIGGER_COUPLING_AC),
+      HSDIG_TEST_VALUE(TRIGGER_COUPLING, TRIGGER_COUPLING_DC),
+      HSDIG_TEST_VALUE(TRIGGER_COUPLING, TRIGGER_COUPLING_HF_REJECT),
+      HSDIG_TEST_VALUE(TRIGGER_COUPLING, TRIGGER_COUPLING_LF_REJECT),
+      HSDIG_TEST_VALUE(TRIGGER_COUPLING, TRIGGER_COUPLING_AC_PLUS_HF_REJECT),
+      HSDIG_TEST_VALUE(TRIGGER_WINDOW_MODE, ENTERING_WINDOW),
+      HSDIG_TEST_VALUE(TRIGGER_WINDOW_MODE, LEAVING_WINDOW),
+      HSDIG_TEST_VALUE(TRIGGER_POLARITY, POLARITY_POSITIVE),
+      HSDIG_TEST_VALUE(TRIGGER_POLARITY, POLARITY_NEGATIVE),
+      HSDIG_TEST_VALUE(TRIGGER_POLARITY, POLARITY_EITHER),
+      HSDIG_TEST_VALUE(TRIGGER_WIDTH_CONDITION, WITHIN),
+      HSDIG_TEST_VALUE(TRIGGER_WIDTH_CONDITION, OUTSIDE),
+      HSDIG_TEST_VALUE(TRIGGER_GLITCH_CONDITION, LESS_THAN),
+      HSDIG_TEST_VALUE(TRIGGER_GLITCH_CONDITION, GREATER_THAN),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_FORMAT, NTSC),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_FORMAT, PAL),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_FORMAT, SECAM),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_FORMAT, M_PAL),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_EVENT, VIDEO_ANY_FIELD),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_EVENT, VIDEO_FIELD1),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_EVENT, VIDEO_FIELD2),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_EVENT, VIDEO_ANY_LINE),
+      HSDIG_TEST_VALUE(TRIGGER_VIDEO_EVENT, VIDEO_LINE_NUMBER),
+      HSDIG_TEST_VALUE(PRIVILEGE_LEVEL, PRIVILEGE_NONE),
+      HSDIG_TEST_VALUE(PRIVILEGE_LEVEL, PRIVILEGE_OBSERVE),
+      HSDIG_TEST_VALUE(PRIVILEGE_LEVEL, PRIVILEGE_CONFIGURE),
+      HSDIG_TEST_VALUE(PRIVILEGE_LEVEL, PRIVILEGE_CONTROL),
+      HSDIG_TEST_VALUE(FETCH_RELATIVE_TO, START_RELATIVE),
+      HSDIG_TEST_VALUE(FETCH_RELATIVE_TO, TRIGGER_RELATIVE),
+  };
+#undef HSDIG_TEST_VALUE
+  std::set<std::string> valueKeys;
+  for (const auto& [attribute, value, name] : values) {
+    std::string key = keyOf(attribute) + " value " + std::to_string(value);
+    SCOPED_TRACE(key);
+    valueKeys.insert(key);
+    EXPECT_EQ(textOf(key), name);
+  }
+
+  // Nothing beyond: no stale attribute of the digitizer's id block, no value
+  // name the driver does not define.
+  for (const auto& [key, text] : entries) {
+    std::string id = key.substr(0, 8);
+    if (id < keyOf(1250000) || id > keyOf(1259999)) continue;
+    if (key.size() == 8) {
+      EXPECT_TRUE(driverKeys.count(key)) << key << " (" << text << ") is not a driver attribute";
+    } else {
+      EXPECT_TRUE(valueKeys.count(key)) << key << " (" << text << ") is not a driver value";
+    }
+  }
 }
 
 TEST_F(TermTables, EnglishTextsAreCompleteSentences) {

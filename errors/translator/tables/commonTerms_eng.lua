@@ -58,6 +58,9 @@ local entries = {
   File = "File",
   Line = "Line",
   ["Internal Error"] = "Internal error",
+  -- The parts of a description the translator did not use, shown as JSON;
+  -- the key is a name and stays the same in every language.
+  rest_of_input_json = "rest_of_input_json",
 }
 
 return require("cvmxl_utilities").stringTable(entries)
