@@ -10,7 +10,6 @@
 #include <cstdio>
 #include <fstream>
 #include <map>
-#include <regex>
 #include <set>
 #include <sstream>
 #include <string>
@@ -112,11 +111,14 @@ std::vector<std::string> parityProblems(lua_State* L, const std::string& english
 
 std::vector<std::string> languageModules(const char* prefix) {
   std::vector<std::string> out;
-  std::regex pattern(std::string("^") + prefix + "([a-z]{3})$");
+  const std::string start(prefix);
   for (std::size_t i = 0; i < kEmbeddedModuleCount; ++i) {
-    std::smatch match;
     std::string name = kEmbeddedModules[i].name;
-    if (std::regex_match(name, match, pattern) && match[1] != "eng") out.push_back(name);
+    if (name.size() != start.size() + 3 || name.compare(0, start.size(), start) != 0) continue;
+    std::string language = name.substr(start.size());
+    bool lowerCase =
+        std::all_of(language.begin(), language.end(), [](char c) { return c >= 'a' && c <= 'z'; });
+    if (lowerCase && language != "eng") out.push_back(name);
   }
   return out;
 }
@@ -261,10 +263,16 @@ std::vector<int32_t> engineStatusCodes() {
   text << in.rdbuf();
   std::string header = text.str();
   std::vector<int32_t> codes;
-  std::regex define(R"(#define\s+(IVI_ERROR_\w+)\s+\(\(ViStatus\)0x([0-9A-Fa-f]{8})\))");
-  for (std::sregex_iterator it(header.begin(), header.end(), define), end; it != end; ++it) {
-    if ((*it)[1] == "IVI_ERROR_BASE") continue;
-    codes.push_back(ivi(static_cast<uint32_t>(std::stoul((*it)[2], nullptr, 16))));
+  const std::string prefix = "#define IVI_ERROR_", cast = "((ViStatus)0x";
+  for (size_t at = header.find(prefix); at != std::string::npos; at = header.find(prefix, at + 1)) {
+    size_t nameEnd = header.find_first_of(" \t", at + prefix.size());
+    size_t value = header.find_first_not_of(" \t", nameEnd);
+    if (nameEnd == std::string::npos || value == std::string::npos ||
+        header.compare(value, cast.size(), cast) != 0)
+      continue;
+    if (header.compare(at + 8, nameEnd - at - 8, "IVI_ERROR_BASE") == 0) continue;
+    codes.push_back(
+        ivi(static_cast<uint32_t>(std::stoul(header.substr(value + cast.size(), 8), nullptr, 16))));
   }
   for (int32_t code = IVI_ERROR_PARAMETER1; code <= IVI_ERROR_PARAMETER8; ++code) {
     codes.push_back(code);
