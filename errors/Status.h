@@ -61,6 +61,11 @@ class Status {
   // Back to success with an empty description.
   void reset();
 
+  // Sets the code outside the replacement rule, keeping the description.
+  // Only for moving a held code into another numbering of the same status
+  // (an infrastructure code mapped into the driver's range).
+  void renumber(int32_t code) noexcept { code_ = code; }
+
   // The structured error description. It is a JSON null until something is
   // written; writers make it an object. The document owns its allocator.
   rapidjson::Document& description() noexcept { return description_; }
