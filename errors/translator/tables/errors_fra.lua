@@ -148,7 +148,7 @@ local entries = {
   [0xBFFA500A] = "La configuration d'attributs enregistrée est endommagée, incomplète ou destinée à un " ..
     "autre modèle.",
   [0xBFFA500B] = "Le fichier ne peut pas être ouvert, lu ou écrit.",
-  [0xBFFA500C] = "L'offset ou la taille du registre n'est pas valide, ou le registre est en lecture seule.",
+  [0xBFFA500C] = "Le décalage ou la taille du registre n'est pas valide, ou le registre est en lecture seule.",
   [0xBFFA500D] = "Les enregistrements de l'acquisition exigent plus d'échantillons par voie que la " ..
     "mémoire d'acquisition de l'instrument ne peut en contenir.",
   [0xBFFA500E] = "La source ou la borne de déclenchement n'est pas valide pour ce type de déclenchement " ..
