@@ -64,15 +64,15 @@ extern "C" {
 #define IVI_VAL_DONT_MARK_AS_SET_BY_USER 0x0004
 
 /* ---- Engine attributes present in every session ---- */
-#define IVI_ATTR_CACHE 1050001                   /* ViBoolean, option "Cache" */
+#define IVI_ATTR_CACHE 1050004                   /* ViBoolean, option "Cache" */
 #define IVI_ATTR_RANGE_CHECK 1050002             /* ViBoolean, option "RangeCheck" */
 #define IVI_ATTR_QUERY_INSTRUMENT_STATUS 1050003 /* ViBoolean, option "QueryInstrStatus" */
-#define IVI_ATTR_RECORD_COERCIONS 1050004        /* ViBoolean, option "RecordCoercions" */
+#define IVI_ATTR_RECORD_COERCIONS 1050006        /* ViBoolean, option "RecordCoercions" */
 #define IVI_ATTR_SIMULATE 1050005                /* ViBoolean, option "Simulate" */
-#define IVI_ATTR_INTERCHANGE_CHECK 1050006       /* ViBoolean, option "InterchangeCheck" */
+#define IVI_ATTR_INTERCHANGE_CHECK 1050021       /* ViBoolean, option "InterchangeCheck" */
 #define IVI_ATTR_DRIVER_SETUP 1050007            /* ViString, option "DriverSetup" */
-#define IVI_ATTR_SPY 1050008                     /* ViBoolean, always false */
-#define IVI_ATTR_USE_SPECIFIC_SIMULATION 1050009 /* ViBoolean, follows "Simulate" */
+#define IVI_ATTR_SPY 1050022                     /* ViBoolean, always false */
+#define IVI_ATTR_USE_SPECIFIC_SIMULATION 1050023 /* ViBoolean, follows "Simulate" */
 #define IVI_ATTR_PRIMARY_ERROR 1050101           /* ViInt32 */
 #define IVI_ATTR_SECONDARY_ERROR 1050102         /* ViInt32 */
 #define IVI_ATTR_ERROR_ELABORATION 1050103       /* ViString */
