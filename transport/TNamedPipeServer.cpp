@@ -13,24 +13,13 @@
 #include "platform/Identity.h"
 #include "platform/Syscalls.h"
 #include "transport/TPipe.h"
+#include "transport/WaitSet.h"
 
 namespace hsdig::transport {
 
 namespace {
 
 using apache::thrift::transport::TTransportException;
-
-[[noreturn]] void eventCreationFailed(int error) {
-  platform::reportErrno("TManualResetEvent unable to create event, GLE=", error);
-  throw apache::thrift::concurrency::SystemResourceException("CreateEvent failed");
-}
-
-void watch(int waitSet, int fd) {
-  epoll_event event{};
-  event.events = EPOLLIN;
-  event.data.fd = fd;
-  if (platform::sys::epoll_ctl(waitSet, EPOLL_CTL_ADD, fd, &event) != 0) eventCreationFailed(errno);
-}
 
 int acceptOne(int listener) {
   return platform::sys::accept4(listener, nullptr, nullptr, SOCK_NONBLOCK | SOCK_CLOEXEC);
@@ -50,8 +39,8 @@ TNamedPipeServer::TNamedPipeServer(const PipePath& path, int backlog,
   if (const int error = listenEvent_.create(); error != 0) eventCreationFailed(error);
   waitSet_.reset(platform::sys::epoll_create1(EPOLL_CLOEXEC));
   if (!waitSet_) eventCreationFailed(errno);
-  watch(waitSet_.get(), listener_.fd());
-  watch(waitSet_.get(), listenEvent_.fd());
+  addToWaitSet(waitSet_.get(), listener_.fd());
+  addToWaitSet(waitSet_.get(), listenEvent_.fd());
   std::lock_guard lock(mutex_);
   initiateNextConnection();
 }

@@ -10,6 +10,7 @@
 #include "platform/Diagnostic.h"
 #include "platform/Syscalls.h"
 #include "transport/SocketIo.h"
+#include "transport/WaitSet.h"
 
 namespace hsdig::transport {
 
@@ -21,18 +22,6 @@ constexpr socketio::ReadTexts kServerReadTexts{
     "TPipe: GetOverlappedResult failed",
 };
 
-[[noreturn]] void eventCreationFailed(int error) {
-  platform::reportErrno("TManualResetEvent unable to create event, GLE=", error);
-  throw apache::thrift::concurrency::SystemResourceException("CreateEvent failed");
-}
-
-void watch(int waitSet, int fd) {
-  epoll_event event{};
-  event.events = EPOLLIN;
-  event.data.fd = fd;
-  if (platform::sys::epoll_ctl(waitSet, EPOLL_CTL_ADD, fd, &event) != 0) eventCreationFailed(errno);
-}
-
 }  // namespace
 
 TWaitableNamedPipeImpl::TWaitableNamedPipeImpl(platform::UniqueFd socket)
@@ -40,8 +29,8 @@ TWaitableNamedPipeImpl::TWaitableNamedPipeImpl(platform::UniqueFd socket)
   if (const int error = ready_.create(); error != 0) eventCreationFailed(error);
   waitSet_.reset(platform::sys::epoll_create1(EPOLL_CLOEXEC));
   if (!waitSet_) eventCreationFailed(errno);
-  watch(waitSet_.get(), socket_.get());
-  watch(waitSet_.get(), ready_.fd());
+  addToWaitSet(waitSet_.get(), socket_.get());
+  addToWaitSet(waitSet_.get(), ready_.fd());
 }
 
 uint32_t TWaitableNamedPipeImpl::read(uint8_t* buffer, uint32_t length) {
