@@ -84,25 +84,8 @@ std::string errorOf(const std::function<void()>& f) {
   return "no exception";
 }
 
-class FaultTest : public test::TransportTest {
+class FaultTest : public test::ConnectedPipeTest {
  protected:
-  void connect() {
-    server_ = std::make_unique<TPipeServer>(uniqueName());
-    server_->listen();
-    client_ = std::make_unique<TPipe>(uniqueName());
-    client_->open();
-    accepted_ = server_->acceptPipe();
-  }
-  void TearDown() override {
-    accepted_.reset();
-    client_.reset();
-    server_.reset();
-    test::TransportTest::TearDown();
-  }
-  std::unique_ptr<TPipeServer> server_;
-  std::unique_ptr<TPipe> client_;
-  std::shared_ptr<TPipe> accepted_;
-
   sys::ScopedSyscall<&sys::detail::recv_entry> recvHook_{&failingRecv};
   sys::ScopedSyscall<&sys::detail::send_entry> sendHook_{&failingSend};
   sys::ScopedSyscall<&sys::detail::poll_entry> pollHook_{&failingPoll};

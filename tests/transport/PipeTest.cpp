@@ -65,27 +65,7 @@ void expectTransportError(F&& f, TTransportException::TTransportExceptionType ty
   }
 }
 
-class PipeTest : public test::TransportTest {
- protected:
-  // A listening server, an open client and the server's end of it.
-  void connect() {
-    server_ = std::make_unique<TPipeServer>(uniqueName());
-    server_->listen();
-    client_ = std::make_unique<TPipe>(uniqueName());
-    client_->open();
-    accepted_ = server_->acceptPipe();
-  }
-  void TearDown() override {
-    accepted_.reset();
-    client_.reset();
-    server_.reset();
-    test::TransportTest::TearDown();
-  }
-
-  std::unique_ptr<TPipeServer> server_;
-  std::unique_ptr<TPipe> client_;
-  std::shared_ptr<TPipe> accepted_;
-};
+using PipeTest = test::ConnectedPipeTest;
 
 TEST_F(PipeTest, RoundTripsOfEverySize) {
   connect();

@@ -9,8 +9,12 @@
 #include <gtest/gtest.h>
 #include <sys/types.h>
 
+#include <memory>
 #include <string>
 #include <vector>
+
+#include "transport/TPipe.h"
+#include "transport/TPipeServer.h"
 
 namespace hsdig::transport::test {
 
@@ -37,6 +41,29 @@ class TransportTest : public ::testing::Test {
   std::string root_;
   std::string socketFolder_;
   int descriptorsBefore_ = 0;
+};
+
+// A TransportTest with one connection: a listening server, an open client
+// and the server's end of it, made by connect().
+class ConnectedPipeTest : public TransportTest {
+ protected:
+  void connect() {
+    server_ = std::make_unique<transport::TPipeServer>(uniqueName());
+    server_->listen();
+    client_ = std::make_unique<transport::TPipe>(uniqueName());
+    client_->open();
+    accepted_ = server_->acceptPipe();
+  }
+  void TearDown() override {
+    accepted_.reset();
+    client_.reset();
+    server_.reset();
+    TransportTest::TearDown();
+  }
+
+  std::unique_ptr<transport::TPipeServer> server_;
+  std::unique_ptr<transport::TPipe> client_;
+  std::shared_ptr<transport::TPipe> accepted_;
 };
 
 // A running transport_peer. The destructor closes its input (which ends a
