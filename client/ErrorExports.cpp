@@ -55,7 +55,7 @@ HSDIGREMOTE_API ViStatus hsdigRemote_GetErrorMessage(ViSession vi, ViStatus erro
     // renderer is asked directly rather than translateStatus, which leaves
     // a zero status without text.
     try {
-      text = static_cast<RemoteErrorConverter&>(remoteErrorConverter()).render(status, language);
+      text = RemoteErrorConverter::render(status, language);
     } catch (...) {
       remoteErrorConverter().convertCurrentException(result);
     }

@@ -81,7 +81,7 @@ class RemoteErrorConverter : public RemoteErrorConverterInterface {
 
   // The translator's text of `status`, also for code 0. Throws what the
   // translation throws; a translation without text throws Exception.
-  std::string render(const Status& status, uint32_t language);
+  static std::string render(const Status& status, uint32_t language);
 };
 
 RemoteErrorConverterInterface& remoteErrorConverter();

@@ -81,8 +81,7 @@ TEST_F(ErrorExports, GetErrorMessageSizeProtocol) {
   const ViInt32 zeroLength = hsdigRemote_GetErrorMessage(session_.handle(), 0, 0, nullptr);
   std::string zero(static_cast<size_t>(zeroLength) + 1, '#');
   EXPECT_EQ(hsdigRemote_GetErrorMessage(session_.handle(), 0, zeroLength + 1, zero.data()), 0);
-  EXPECT_EQ(std::string(zero.c_str()),
-            static_cast<RemoteErrorConverter&>(remoteErrorConverter()).render(Status(), 0))
+  EXPECT_EQ(std::string(zero.c_str()), RemoteErrorConverter::render(Status(), 0))
       << "code 0 gives the translator's text for it";
 }
 
