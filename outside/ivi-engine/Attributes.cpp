@@ -159,60 +159,60 @@ void invalidateDependents(Session& s, const Attribute& a, const std::string& key
 template <class T>
 ViStatus setOrCheck(ViSession vi, ViConstString channelName, ViAttr id, ViInt32 optionFlags,
                     typename Traits<T>::In value, bool checkOnly) {
-  return withSession(vi, [&](Session& s) -> ViStatus {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, id, Traits<T>::type, channelName, a, key); st < 0) {
-      return st;
-    }
-    if (a->flags & IVI_VAL_NOT_SUPPORTED) return IVI_ERROR_ATTRIBUTE_NOT_SUPPORTED;
-    const bool user = optionFlags & IVI_VAL_DIRECT_USER_CALL;
-    if ((a->flags & IVI_VAL_NOT_WRITABLE) || (user && (a->flags & IVI_VAL_NOT_USER_WRITABLE))) {
-      return IVI_ERROR_ATTRIBUTE_NOT_WRITABLE;
-    }
-    const auto v = toStored<T>(value);
-    ViStatus warning = VI_SUCCESS;
-    auto keep = [&](ViStatus st) {
-      if (st > 0 && warning == VI_SUCCESS) warning = st;
-      return st;
-    };
-    if (checkOnly || directBoolean(s, IVI_ATTR_RANGE_CHECK)) {
-      if (ViStatus st = runCheck<T>(s, *a, key, v); keep(st) < 0) return st;
-    }
-    if (checkOnly) return warning;
-    typename Traits<T>::Stored coerced;
-    if (ViStatus st = runCoerce<T>(s, *a, key, v, coerced); keep(st) < 0) return st;
-    if constexpr (Traits<T>::numeric) {
-      if (coerced != v && directBoolean(s, IVI_ATTR_RECORD_COERCIONS)) {
-        std::string where = key.empty() ? "" : " on \"" + key + "\"";
-        s.coercionRecords.push_back("Attribute " + a->name + where + ": " + describe<T>(v) +
-                                    " was coerced to " + describe<T>(coerced) + ".");
-      }
-    }
-    Instance& inst = instanceOf(*a, key);
-    bool same = false;
-    if (cachingOn(s, *a) && inst.cacheValid) {
-      if (ViStatus st = compareEqual<T>(s, *a, key, coerced,
-                                        std::get<typename Traits<T>::Stored>(inst.value), same);
-          keep(st) < 0) {
-        return st;
-      }
-    }
-    if (!same && !(optionFlags & IVI_VAL_SET_CACHE_ONLY)) {
-      if (auto cb = reinterpret_cast<typename Traits<T>::Write>(a->callbacks[IVI_CALLBACK_WRITE])) {
-        ViSession io = 0;
-        if (Value* iov = directValue(s, IVI_ATTR_IO_SESSION)) io = std::get<ViSession>(*iov);
-        if (ViStatus st = cb(vi, io, key.c_str(), id, toIn<T>(coerced)); keep(st) < 0) return st;
-      }
-    }
-    inst.value = coerced;
-    inst.cacheValid = !(a->flags & IVI_VAL_NEVER_CACHE);
-    if (user && !(optionFlags & IVI_VAL_DONT_MARK_AS_SET_BY_USER)) {
-      inst.setByUser = inst.everSetByUser = true;
-    }
-    if (!same) invalidateDependents(s, *a, key);
-    return warning;
-  });
+  return withInstance(
+      vi, channelName, id, Traits<T>::type,
+      [&]([[maybe_unused]] Session& s, Attribute* a,
+          [[maybe_unused]] const std::string& key) -> ViStatus {
+        if (a->flags & IVI_VAL_NOT_SUPPORTED) return IVI_ERROR_ATTRIBUTE_NOT_SUPPORTED;
+        const bool user = optionFlags & IVI_VAL_DIRECT_USER_CALL;
+        if ((a->flags & IVI_VAL_NOT_WRITABLE) || (user && (a->flags & IVI_VAL_NOT_USER_WRITABLE))) {
+          return IVI_ERROR_ATTRIBUTE_NOT_WRITABLE;
+        }
+        const auto v = toStored<T>(value);
+        ViStatus warning = VI_SUCCESS;
+        auto keep = [&](ViStatus st) {
+          if (st > 0 && warning == VI_SUCCESS) warning = st;
+          return st;
+        };
+        if (checkOnly || directBoolean(s, IVI_ATTR_RANGE_CHECK)) {
+          if (ViStatus st = runCheck<T>(s, *a, key, v); keep(st) < 0) return st;
+        }
+        if (checkOnly) return warning;
+        typename Traits<T>::Stored coerced;
+        if (ViStatus st = runCoerce<T>(s, *a, key, v, coerced); keep(st) < 0) return st;
+        if constexpr (Traits<T>::numeric) {
+          if (coerced != v && directBoolean(s, IVI_ATTR_RECORD_COERCIONS)) {
+            std::string where = key.empty() ? "" : " on \"" + key + "\"";
+            s.coercionRecords.push_back("Attribute " + a->name + where + ": " + describe<T>(v) +
+                                        " was coerced to " + describe<T>(coerced) + ".");
+          }
+        }
+        Instance& inst = instanceOf(*a, key);
+        bool same = false;
+        if (cachingOn(s, *a) && inst.cacheValid) {
+          if (ViStatus st = compareEqual<T>(s, *a, key, coerced,
+                                            std::get<typename Traits<T>::Stored>(inst.value), same);
+              keep(st) < 0) {
+            return st;
+          }
+        }
+        if (!same && !(optionFlags & IVI_VAL_SET_CACHE_ONLY)) {
+          if (auto cb =
+                  reinterpret_cast<typename Traits<T>::Write>(a->callbacks[IVI_CALLBACK_WRITE])) {
+            ViSession io = 0;
+            if (Value* iov = directValue(s, IVI_ATTR_IO_SESSION)) io = std::get<ViSession>(*iov);
+            if (ViStatus st = cb(vi, io, key.c_str(), id, toIn<T>(coerced)); keep(st) < 0)
+              return st;
+          }
+        }
+        inst.value = coerced;
+        inst.cacheValid = !(a->flags & IVI_VAL_NEVER_CACHE);
+        if (user && !(optionFlags & IVI_VAL_DONT_MARK_AS_SET_BY_USER)) {
+          inst.setByUser = inst.everSetByUser = true;
+        }
+        if (!same) invalidateDependents(s, *a, key);
+        return warning;
+      });
 }
 
 template <class T>
@@ -485,16 +485,14 @@ ViBoolean Ivi_AttributeIsAvailable(ViSession vi, ViAttr attributeId) {
 }
 
 ViStatus Ivi_ResetAttribute(ViSession vi, ViConstString channelName, ViAttr attributeId) {
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, 0, channelName, a, key); st < 0) return st;
-    Instance& inst = instanceOf(*a, key);
-    inst.value = a->defaultValue;
-    inst.cacheValid = false;
-    inst.setByUser = false;
-    return VI_SUCCESS;
-  });
+  return withInstance(vi, channelName, attributeId, 0,
+                      [&](Session&, Attribute* a, const std::string& key) {
+                        Instance& inst = instanceOf(*a, key);
+                        inst.value = a->defaultValue;
+                        inst.cacheValid = false;
+                        inst.setByUser = false;
+                        return VI_SUCCESS;
+                      });
 }
 
 ViStatus Ivi_DeleteAttribute(ViSession vi, ViAttr attributeId) {
@@ -561,16 +559,14 @@ ViStatus Ivi_GetAttributeRepCapName(ViSession vi, ViAttr attributeId, ViInt32 bu
 namespace {
 ViBoolean userSetState(ViSession vi, ViConstString channelName, ViAttr attributeId, bool ever) {
   ViBoolean result = VI_FALSE;
-  withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, 0, channelName, a, key); st < 0) return st;
-    auto it = a->instances.find(key);
-    if (it != a->instances.end()) {
-      result = (ever ? it->second.everSetByUser : it->second.setByUser) ? VI_TRUE : VI_FALSE;
-    }
-    return VI_SUCCESS;
-  });
+  withInstance(
+      vi, channelName, attributeId, 0, [&](Session&, Attribute* a, const std::string& key) {
+        auto it = a->instances.find(key);
+        if (it != a->instances.end()) {
+          result = (ever ? it->second.everSetByUser : it->second.setByUser) ? VI_TRUE : VI_FALSE;
+        }
+        return VI_SUCCESS;
+      });
   return result;
 }
 }  // namespace
@@ -628,15 +624,14 @@ ViStatus Ivi_InvalidateAllAttributes(ViSession vi) {
 ViStatus Ivi_AttributeIsCached(ViSession vi, ViConstString channelName, ViAttr attributeId,
                                ViBoolean* isCached) {
   if (!isCached) return IVI_ERROR_NULL_POINTER;
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, 0, channelName, a, key); st < 0) return st;
-    auto it = a->instances.find(key);
-    *isCached = (it != a->instances.end() && it->second.cacheValid && cachingOn(s, *a)) ? VI_TRUE
-                                                                                        : VI_FALSE;
-    return VI_SUCCESS;
-  });
+  return withInstance(
+      vi, channelName, attributeId, 0, [&](Session& s, Attribute* a, const std::string& key) {
+        auto it = a->instances.find(key);
+        *isCached = (it != a->instances.end() && it->second.cacheValid && cachingOn(s, *a))
+                        ? VI_TRUE
+                        : VI_FALSE;
+        return VI_SUCCESS;
+      });
 }
 
 ViStatus Ivi_AddAttributeInvalidation(ViSession vi, ViAttr attributeId,
@@ -696,15 +691,10 @@ template <class T>
 ViStatus coercedValue(ViSession vi, ViConstString channelName, ViAttr attributeId, T value,
                       T* coerced) {
   if (!coerced) return IVI_ERROR_NULL_POINTER;
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, Traits<T>::type, channelName, a, key);
-        st < 0) {
-      return st;
-    }
-    return runCoerce<T>(s, *a, key, value, *coerced);
-  });
+  return withInstance(vi, channelName, attributeId, Traits<T>::type,
+                      [&](Session& s, Attribute* a, const std::string& key) {
+                        return runCoerce<T>(s, *a, key, value, *coerced);
+                      });
 }
 
 ViStatus nextCoercion(ViSession vi, ViInt32 bufferSize, ViChar record[]) {
@@ -744,12 +734,10 @@ ViStatus Ivi_SetAttrRangeTableCallback(ViSession vi, ViAttr attributeId,
 ViStatus Ivi_GetAttrRangeTable(ViSession vi, ViConstString channelName, ViAttr attributeId,
                                IviRangeTablePtr* rangeTable) {
   if (!rangeTable) return IVI_ERROR_NULL_POINTER;
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, 0, channelName, a, key); st < 0) return st;
-    return rangeTableOf(s, *a, key, *rangeTable);
-  });
+  return withInstance(vi, channelName, attributeId, 0,
+                      [&](Session& s, Attribute* a, const std::string& key) {
+                        return rangeTableOf(s, *a, key, *rangeTable);
+                      });
 }
 
 ViStatus Ivi_GetStoredRangeTablePtr(ViSession vi, ViAttr attributeId,
@@ -771,61 +759,49 @@ ViStatus Ivi_SetStoredRangeTablePtr(ViSession vi, ViAttr attributeId, IviRangeTa
 namespace {
 template <class T>
 ViStatus defaultCheck(ViSession vi, ViConstString channelName, ViAttr attributeId, T value) {
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, Traits<T>::type, channelName, a, key);
-        st < 0) {
-      return st;
-    }
-    IviRangeTablePtr table = nullptr;
-    if (ViStatus st = rangeTableOf(s, *a, key, table); st < 0) return st;
-    return table ? checkWithTable<T>(table, value, a->comparePrecision) : VI_SUCCESS;
-  });
+  return withInstance(vi, channelName, attributeId, Traits<T>::type,
+                      [&](Session& s, Attribute* a, const std::string& key) {
+                        IviRangeTablePtr table = nullptr;
+                        if (ViStatus st = rangeTableOf(s, *a, key, table); st < 0) return st;
+                        return table ? checkWithTable<T>(table, value, a->comparePrecision)
+                                     : VI_SUCCESS;
+                      });
 }
 
 template <class T>
 ViStatus defaultCoerce(ViSession vi, ViConstString channelName, ViAttr attributeId, T value,
                        T* coerced) {
   if (!coerced) return IVI_ERROR_NULL_POINTER;
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, Traits<T>::type, channelName, a, key);
-        st < 0) {
-      return st;
-    }
-    *coerced = value;
-    IviRangeTablePtr table = nullptr;
-    if (ViStatus st = rangeTableOf(s, *a, key, table); st < 0) return st;
-    if (table && table->type == IVI_VAL_COERCED) return coerceWithTable<T>(table, value, *coerced);
-    return VI_SUCCESS;
-  });
+  return withInstance(vi, channelName, attributeId, Traits<T>::type,
+                      [&](Session& s, Attribute* a, const std::string& key) {
+                        *coerced = value;
+                        IviRangeTablePtr table = nullptr;
+                        if (ViStatus st = rangeTableOf(s, *a, key, table); st < 0) return st;
+                        if (table && table->type == IVI_VAL_COERCED)
+                          return coerceWithTable<T>(table, value, *coerced);
+                        return VI_SUCCESS;
+                      });
 }
 
 template <class T>
 ViStatus minMax(ViSession vi, ViConstString channelName, ViAttr attributeId, T* minValue,
                 T* maxValue, ViBoolean* hasMin, ViBoolean* hasMax) {
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, Traits<T>::type, channelName, a, key);
-        st < 0) {
-      return st;
-    }
-    IviRangeTablePtr table = nullptr;
-    if (ViStatus st = rangeTableOf(s, *a, key, table); st < 0) return st;
-    T lo{}, hi{};
-    bool hasLo = false, hasHi = false;
-    if (table) {
-      if (ViStatus st = minMaxOfTable<T>(table, lo, hi, hasLo, hasHi); st < 0) return st;
-    }
-    if (minValue) *minValue = lo;
-    if (maxValue) *maxValue = hi;
-    if (hasMin) *hasMin = hasLo ? VI_TRUE : VI_FALSE;
-    if (hasMax) *hasMax = hasHi ? VI_TRUE : VI_FALSE;
-    return VI_SUCCESS;
-  });
+  return withInstance(vi, channelName, attributeId, Traits<T>::type,
+                      [&](Session& s, Attribute* a, const std::string& key) {
+                        IviRangeTablePtr table = nullptr;
+                        if (ViStatus st = rangeTableOf(s, *a, key, table); st < 0) return st;
+                        T lo{}, hi{};
+                        bool hasLo = false, hasHi = false;
+                        if (table) {
+                          if (ViStatus st = minMaxOfTable<T>(table, lo, hi, hasLo, hasHi); st < 0)
+                            return st;
+                        }
+                        if (minValue) *minValue = lo;
+                        if (maxValue) *maxValue = hi;
+                        if (hasMin) *hasMin = hasLo ? VI_TRUE : VI_FALSE;
+                        if (hasMax) *hasMax = hasHi ? VI_TRUE : VI_FALSE;
+                        return VI_SUCCESS;
+                      });
 }
 }  // namespace
 
@@ -871,16 +847,11 @@ ViStatus Ivi_DefaultCoerceCallbackViBoolean(ViSession vi, ViConstString channelN
                                             ViAttr attributeId, ViBoolean value,
                                             ViBoolean* coerced) {
   if (!coerced) return IVI_ERROR_NULL_POINTER;
-  return withSession(vi, [&](Session& s) {
-    Attribute* a = nullptr;
-    std::string key;
-    if (ViStatus st = lookupAttribute(s, attributeId, IVI_VAL_BOOLEAN, channelName, a, key);
-        st < 0) {
-      return st;
-    }
-    *coerced = value ? VI_TRUE : VI_FALSE;
-    return VI_SUCCESS;
-  });
+  return withInstance(vi, channelName, attributeId, IVI_VAL_BOOLEAN,
+                      [&](Session&, Attribute*, const std::string&) {
+                        *coerced = value ? VI_TRUE : VI_FALSE;
+                        return VI_SUCCESS;
+                      });
 }
 
 ViStatus Ivi_GetAttrMinMaxViInt32(ViSession vi, ViConstString channelName, ViAttr attributeId,

@@ -37,6 +37,20 @@ CVIVI_TRAITS(ViAddr, IVI_VAL_ADDR, ViAddr, ViAddr, false)
 ViStatus lookupAttribute(Session& s, ViAttr id, ViInt32 type, ViConstString channelName,
                          Attribute*& attribute, std::string& key);
 
+// Runs body(session, attribute, key) on session `vi` for the instance of
+// attribute `id` that `channelName` names, after the lookup above; a failed
+// lookup is returned without running `body`.
+template <class Body>
+ViStatus withInstance(ViSession vi, ViConstString channelName, ViAttr id, ViInt32 type,
+                      Body&& body) noexcept {
+  return withSession(vi, [&](Session& s) -> ViStatus {
+    Attribute* a = nullptr;
+    std::string key;
+    if (ViStatus st = lookupAttribute(s, id, type, channelName, a, key); st < 0) return st;
+    return body(s, a, key);
+  });
+}
+
 // The canonical name of `name` in the repeated capability `repCap`.
 ViStatus resolveRepCapName(Session& s, const std::string& repCap, std::string_view name,
                            std::string& canonical);
