@@ -1,7 +1,9 @@
 #include "server/ServerReadWatch.h"
 
+#include <malloc.h>
 #include <poll.h>
 
+#include <algorithm>
 #include <cstring>
 
 #include <thrift/protocol/TProtocolException.h>
@@ -33,6 +35,10 @@ ServerReadWatch::ServerReadWatch(
       processor_(std::move(processor)),
       maxFrameSize_(maxFrameSize),
       frameBuffer_(kInitialBufferSize, 0) {
+  if (outputProtocol_) {
+    replyTransport_ =
+        dynamic_cast<transport::TStreamingFramedTransport*>(outputProtocol_->getTransport().get());
+  }
   if (eventHandler_) {
     connectionContext_ = eventHandler_->createContext(inputProtocol_, outputProtocol_);
   }
@@ -52,6 +58,13 @@ bool ServerReadWatch::moreBytesWaiting() const {
   if (connection_->isBufferedDataAvailable()) return true;
   pollfd probe{connection_->getNativeWaitHandle(), POLLIN, 0};
   return probe.fd >= 0 && platform::sys::poll(&probe, 1, 0) > 0;
+}
+
+void ServerReadWatch::giveBackMemoryAfterLargeFrames() {
+  // The result (and the request's arguments) are gone by now. Large blocks
+  // the allocator mapped on its own are already unmapped; what it carved
+  // from its heaps stays resident until trimmed.
+  ::malloc_trim(0);
 }
 
 void ServerReadWatch::readMore() {
@@ -131,7 +144,10 @@ void ServerReadWatch::process(UniqueGuard& guard) {
       return;
     }
     if (eventHandler_) eventHandler_->processContext(connectionContext_, connection_);
+    const uint64_t requestBytes = uint64_t{4} + frameSize_;
     if (processor_->process(inputProtocol_, outputProtocol_, &serverContext, connectionContext_)) {
+      const uint64_t replyBytes = replyTransport_ ? replyTransport_->takeLastFlushedFrameBytes() : 0;
+      if (std::max(requestBytes, replyBytes) >= kTrimAfterFrameBytes) giveBackMemoryAfterLargeFrames();
       return;
     }
     platform::reportLine("ServerReadWatch: Stream header is corrupt.");

@@ -28,6 +28,7 @@
 #include "server/IOTaskController.h"
 #include "server/TConcurrentProcessor.h"
 #include "transport/TPipe.h"
+#include "transport/TStreamingFramedTransport.h"
 
 namespace hsdig {
 
@@ -46,6 +47,10 @@ class ServerReadWatch : public IOTask, public std::enable_shared_from_this<Serve
   static constexpr uint32_t kInitialBufferSize = 1024;
   // A frame buffer grown beyond this is given back once it is drained.
   static constexpr uint32_t kShrinkThreshold = 1 << 20;
+  // After a request or reply frame of at least this size, the allocator is
+  // asked to give its free memory back: the handler's large result has just
+  // been freed, and without this the allocator keeps it resident.
+  static constexpr uint64_t kTrimAfterFrameBytes = 1 << 20;
 
   ServerReadWatch(TConcurrentServer& server,
                   std::shared_ptr<apache::thrift::server::TServerEventHandler> eventHandler,
@@ -71,6 +76,7 @@ class ServerReadWatch : public IOTask, public std::enable_shared_from_this<Serve
   bool readFrame();
   void readMore();
   bool moreBytesWaiting() const;
+  void giveBackMemoryAfterLargeFrames();
 
   TConcurrentServer& server_;
   std::shared_ptr<apache::thrift::server::TServerEventHandler> eventHandler_;
@@ -79,6 +85,8 @@ class ServerReadWatch : public IOTask, public std::enable_shared_from_this<Serve
   std::shared_ptr<apache::thrift::transport::TMemoryBuffer> inputBuffer_;
   std::shared_ptr<transport::TPipe> connection_;
   std::shared_ptr<TConcurrentProcessor> processor_;
+  // The reply transport when it reports its frame sizes, else null.
+  transport::TStreamingFramedTransport* replyTransport_ = nullptr;
   void* connectionContext_ = nullptr;
   MultiTask* multiTask_ = nullptr;
   Controller* controller_ = nullptr;

@@ -7,6 +7,7 @@
 #include "platform/Diagnostic.h"
 #include "server/ServerAcceptWatch.h"
 #include "server/ServerReadWatch.h"
+#include "transport/TStreamingFramedTransport.h"
 
 namespace hsdig {
 
@@ -75,12 +76,11 @@ void TConcurrentServer::add(std::shared_ptr<transport::TPipe> connection) {
     auto config = contract::makeTransportConfiguration();
     auto inputBuffer = std::make_shared<apache::thrift::transport::TMemoryBuffer>(config);
     auto input = protocolFactory_->getProtocol(inputBuffer);
-    // A reply larger than the reclaim threshold leaves no buffer of its size
-    // behind once it has been sent.
-    auto framed = std::make_shared<apache::thrift::transport::TFramedTransport>(
-        connection,
-        static_cast<uint32_t>(apache::thrift::transport::TFramedTransport::DEFAULT_BUFFER_SIZE),
-        kReplyBufferReclaimThreshold, config);
+    // Large reply fields are sent from the handler's own memory; a reply
+    // buffer grown beyond the reclaim threshold is given back once sent.
+    auto framed = std::make_shared<transport::TStreamingFramedTransport>(
+        connection, config, transport::TStreamingFramedTransport::DirectWrites::kOn,
+        kReplyBufferReclaimThreshold);
     auto output = protocolFactory_->getProtocol(framed);
     apache::thrift::TConnectionInfo info{input, output, connection};
     auto processor = processorFactory_->getProcessor(info);

@@ -5,6 +5,7 @@
 #include <thrift/TApplicationException.h>
 
 #include "hsdigEP_methods.h"
+#include "transport/TStreamingFramedTransport.h"
 
 namespace hsdig {
 
@@ -28,11 +29,20 @@ template <class Body>
 void writeReply(CallContext& call, const std::string& name, TMessageType type, Body&& body) {
   call.serverContext->replyStarting();
   call.state = CallContext::kWritingReply;
-  call.oprot->writeMessageBegin(name, type, call.seqid);
-  body(*call.oprot);
-  call.oprot->writeMessageEnd();
-  call.oprot->getTransport()->writeEnd();
-  call.oprot->getTransport()->flush();
+  try {
+    call.oprot->writeMessageBegin(name, type, call.seqid);
+    body(*call.oprot);
+    call.oprot->writeMessageEnd();
+    call.oprot->getTransport()->writeEnd();
+    call.oprot->getTransport()->flush();
+  } catch (...) {
+    // A reply transport that sends large fields from the result's memory
+    // must not keep references to a result that is about to go.
+    auto* streaming =
+        dynamic_cast<transport::TStreamingFramedTransport*>(call.oprot->getTransport().get());
+    if (streaming != nullptr) streaming->discardWrite();
+    throw;
+  }
   call.serverContext->replyFinished();
   call.state = CallContext::kIdle;
 }

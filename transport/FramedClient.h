@@ -1,5 +1,5 @@
-// The client's framing over a pipe: the library's framed transport with the
-// contract's limits (frames up to 0x10000000 bytes).
+// The client's framing over a pipe: frames up to the contract's 0x10000000
+// bytes, read without a whole-frame copy (see TStreamingFramedTransport).
 #pragma once
 
 #include <thrift/transport/TBufferTransports.h>

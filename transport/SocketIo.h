@@ -19,8 +19,10 @@ struct ReadTexts {
 // stream. A time-out throws TTransportException TIMED_OUT
 // "getOverlappedResultWithTimeout timed out" and loses no data: the next read
 // gets what arrives later.
+// With `waitFirst` the wait comes before the first attempt: for a read that
+// follows a request just sent, whose answer cannot be there yet.
 uint32_t receive(int fd, uint8_t* buffer, uint32_t length, int32_t timeoutMs,
-                 const ReadTexts& texts);
+                 const ReadTexts& texts, bool waitFirst = false);
 
 // Sends all `length` bytes, waiting for room at most `timeoutMs` each time
 // the socket is full (no limit below 1). Never raises SIGPIPE: a peer that

@@ -16,11 +16,16 @@ TNamedPipeImpl::TNamedPipeImpl(platform::UniqueFd socket) : socket_(std::move(so
 
 uint32_t TNamedPipeImpl::read(uint8_t* buffer, uint32_t length) {
   if (length == 0) return 0;
-  return socketio::receive(socket_.get(), buffer, length, readTimeoutMs_, kClientReadTexts);
+  const uint32_t got =
+      socketio::receive(socket_.get(), buffer, length, readTimeoutMs_, kClientReadTexts,
+                        answerPending_.load(std::memory_order_relaxed));
+  answerPending_.store(false, std::memory_order_relaxed);
+  return got;
 }
 
 void TNamedPipeImpl::write(const uint8_t* buffer, uint32_t length) {
   socketio::sendAll(socket_.get(), buffer, length, writeTimeoutMs_);
+  answerPending_.store(true, std::memory_order_relaxed);
 }
 
 void TNamedPipeImpl::setTimeouts(int32_t readTimeoutMs, int32_t writeTimeoutMs) {

@@ -3,6 +3,8 @@
 // Used by one reading thread and one writing thread at a time.
 #pragma once
 
+#include <atomic>
+
 #include "platform/UniqueFd.h"
 #include "transport/TPipeImpl.h"
 
@@ -26,6 +28,9 @@ class TNamedPipeImpl : public TPipeImpl {
 
  private:
   platform::UniqueFd socket_;
+  // Set by a write, cleared by a read that got bytes: the next read waits
+  // before it tries, since an answer takes at least a round trip.
+  std::atomic<bool> answerPending_{false};
   int32_t writeTimeoutMs_ = -1;
   int32_t readTimeoutMs_ = -1;
 };

@@ -3,7 +3,7 @@
 // Each server runs in a child process of its own, so its threads and memory
 // are measured alone; the clients run here.
 //
-//   bench_server [--quick]
+//   bench_server [--quick] [--only raw|stock|ours]
 #include <sys/socket.h>
 #include <sys/un.h>
 #include <sys/wait.h>
@@ -28,6 +28,7 @@
 #include <thrift/transport/TSocket.h>
 
 #include "contract/Diagnostics.h"
+#include "contract/TBulkStringBinaryProtocol.h"
 #include "contract/TransportConfiguration.h"
 #include "hsdigEP.h"
 #include "server/Server.h"
@@ -88,10 +89,14 @@ struct ServerProcess {
 // Runs `serve` (which must return once serving) in a child; the child exits
 // when the parent closes the control pipe.
 ServerProcess spawn(const std::function<void()>& serve) {
+  // The control ends of the servers already running: a child must not keep
+  // them open, or closing them would not tell those servers to exit.
+  static std::vector<int> otherControls;
   int ready[2], control[2];
   if (::pipe(ready) != 0 || ::pipe(control) != 0) std::abort();
   pid_t pid = ::fork();
   if (pid == 0) {
+    for (int fd : otherControls) ::close(fd);
     ::close(ready[0]);
     ::close(control[1]);
     serve();
@@ -109,6 +114,7 @@ ServerProcess spawn(const std::function<void()>& serve) {
     std::exit(1);
   }
   ::close(ready[0]);
+  otherControls.push_back(control[1]);
   return ServerProcess{pid, control[1]};
 }
 
@@ -223,9 +229,10 @@ class RawCaller : public Caller {
 
 class ThriftCaller : public Caller {
  public:
-  explicit ThriftCaller(std::shared_ptr<TTransport> framed) : framed_(std::move(framed)) {
-    client_ = std::make_unique<hsdig::hsdigEPClient>(
-        hsdig::contract::makeProtocolFactory()->getProtocol(framed_));
+  // `protocol` reads and writes over `framed`.
+  ThriftCaller(std::shared_ptr<TTransport> framed, std::shared_ptr<TProtocol> protocol)
+      : framed_(std::move(framed)) {
+    client_ = std::make_unique<hsdig::hsdigEPClient>(std::move(protocol));
     framed_->open();
   }
   void call() override {
@@ -260,22 +267,49 @@ struct Figures {
 
 const int kConnections[3] = {1, 8, 64};
 
-Figures measure(const Target& target, ServerProcess& process, bool quick) {
-  Figures f;
-  {
-    auto caller = target.connect();
-    for (int i = 0; i < 1000; ++i) caller->call();  // warm-up
-    const int n = quick ? 2000 : 20000;
-    std::vector<double> us(n);
-    for (int i = 0; i < n; ++i) {
-      auto start = Clock::now();
-      caller->call();
-      us[i] = secondsSince(start) * 1e6;
-    }
-    std::sort(us.begin(), us.end());
-    f.medianUs = us[n / 2];
-    f.p99Us = us[n * 99 / 100];
+// Round trips of one small call from one client, for every server in turn:
+// `rounds` turns of n/rounds calls each, so that a drift of the machine (CPU
+// placement, other load) spreads evenly over the servers compared.
+void measureRoundTrips(const std::vector<const Target*>& targets, std::vector<Figures>& out,
+                       bool quick) {
+  const int rounds = 20;
+  const int perRound = (quick ? 4000 : 40000) / rounds;
+  std::vector<std::unique_ptr<Caller>> callers;
+  std::vector<std::vector<double>> us(targets.size());
+  for (const Target* target : targets) {
+    callers.push_back(target->connect());
+    for (int i = 0; i < 1000; ++i) callers.back()->call();  // warm-up
   }
+  for (int round = 0; round < rounds; ++round) {
+    for (size_t t = 0; t < targets.size(); ++t) {
+      for (int i = 0; i < perRound; ++i) {
+        auto start = Clock::now();
+        callers[t]->call();
+        us[t].push_back(secondsSince(start) * 1e6);
+      }
+    }
+  }
+  for (size_t t = 0; t < targets.size(); ++t) {
+    std::sort(us[t].begin(), us[t].end());
+    out[t].medianUs = us[t][us[t].size() / 2];
+    out[t].p99Us = us[t][us[t].size() * 99 / 100];
+  }
+}
+
+// Resident memory once the server has finished with the last reply: the
+// thread that sent it may still be freeing it while the next call is
+// answered, so the lowest of several samples over half a second counts.
+long settledResidentKiB(const ServerProcess& process) {
+  long lowest = process.residentKiB();
+  for (int i = 0; i < 10; ++i) {
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+    lowest = std::min(lowest, process.residentKiB());
+  }
+  return lowest;
+}
+
+// Calls per second, threads at 64 connections, big replies and memory.
+void measureLoad(const Target& target, ServerProcess& process, bool quick, Figures& f) {
   for (int k = 0; k < 3; ++k) {
     const int connections = kConnections[k];
     const int perConnection = (quick ? 20000 : 100000) / connections;
@@ -316,9 +350,8 @@ Figures measure(const Target& target, ServerProcess& process, bool quick) {
     }
     f.peakMiB = process.peakKiB() / 1024;
     caller->call();  // one small call after the big replies
-    f.residentAfterMiB = process.residentKiB() / 1024;
+    f.residentAfterMiB = settledResidentKiB(process) / 1024;
   }
-  return f;
 }
 
 void printRow(const char* name, const Figures& f, bool big) {
@@ -336,10 +369,29 @@ void printRow(const char* name, const Figures& f, bool big) {
 
 int main(int argc, char** argv) {
   hsdig::diagnostics::installSink(&hsdig::diagnostics::discard);
-  bool quick = argc > 1 && std::strcmp(argv[1], "--quick") == 0;
-  if (argc > 1 && !quick) {
-    std::fprintf(stderr, "usage: bench_server [--quick]\n");
-    return 2;
+  bool quick = false;
+  int only = -1;  // every server
+  const char* names[3] = {"raw", "stock", "ours"};
+  for (int a = 1; a < argc; ++a) {
+    if (std::strcmp(argv[a], "--quick") == 0) {
+      quick = true;
+    } else if (std::strcmp(argv[a], "--only") == 0 && a + 1 < argc) {
+      ++a;
+      for (int t = 0; t < 3; ++t) {
+        if (std::strcmp(argv[a], names[t]) == 0) only = t;
+      }
+      if (only < 0) {
+        std::fprintf(stderr, "bench_server: unknown server '%s' (raw, stock, ours)\n", argv[a]);
+        return 2;
+      }
+    } else {
+      std::fprintf(stderr,
+                   "usage: bench_server [--quick] [--only raw|stock|ours]\n"
+                   "  Prints round trips, calls per second, server threads, reply\n"
+                   "  throughput and server memory, then the ratios of our server.\n"
+                   "  --only measures one server and prints its row alone (for profiling).\n");
+      return std::strcmp(argv[a], "--help") == 0 ? 0 : 2;
+    }
   }
   const std::string tag = std::to_string(::getpid());
   const std::string rawPath = socketPath("raw-" + tag);
@@ -352,14 +404,18 @@ int main(int argc, char** argv) {
                [&] {
                  auto socket =
                      std::make_shared<apache::thrift::transport::TSocket>(stockPath, config);
+                 auto framed =
+                     std::make_shared<apache::thrift::transport::TFramedTransport>(socket, config);
                  return std::make_unique<ThriftCaller>(
-                     std::make_shared<apache::thrift::transport::TFramedTransport>(socket, config));
+                     framed, hsdig::contract::makeProtocolFactory()->getProtocol(framed));
                },
                true};
   Target ours{"hsdig Server",
               [&] {
                 auto pipe = std::make_shared<hsdig::transport::TPipe>(ourName);
-                return std::make_unique<ThriftCaller>(hsdig::transport::makeFramedTransport(pipe));
+                auto framed = hsdig::transport::makeFramedTransport(pipe);
+                return std::make_unique<ThriftCaller>(
+                    framed, std::make_shared<hsdig::contract::TBulkStringBinaryProtocol>(framed));
               },
               true};
 
@@ -371,14 +427,27 @@ int main(int argc, char** argv) {
   const std::function<void()> serves[3] = {[&] { serveRawEcho(rawPath); },
                                            [&] { serveStockThreaded(stockPath); },
                                            [&] { serveOurs(ourName); }};
+  std::vector<int> chosen;
   for (int t = 0; t < 3; ++t) {
-    ServerProcess process = spawn(serves[t]);
-    results[t] = measure(*targets[t], process, quick);
-    process.finish();
-    printRow(targets[t]->name, results[t], targets[t]->hasBigReplies);
+    if (only < 0 || t == only) chosen.push_back(t);
+  }
+  std::vector<ServerProcess> processes;
+  std::vector<const Target*> chosenTargets;
+  for (int t : chosen) {
+    processes.push_back(spawn(serves[t]));
+    chosenTargets.push_back(targets[t]);
+  }
+  std::vector<Figures> figures(chosen.size());
+  measureRoundTrips(chosenTargets, figures, quick);
+  for (size_t c = 0; c < chosen.size(); ++c) {
+    measureLoad(*chosenTargets[c], processes[c], quick, figures[c]);
+    processes[c].finish();
+    results[chosen[c]] = figures[c];
+    printRow(chosenTargets[c]->name, figures[c], chosenTargets[c]->hasBigReplies);
   }
   ::unlink(rawPath.c_str());
   ::unlink(stockPath.c_str());
+  if (only >= 0) return 0;
 
   const Figures& r = results[0];
   const Figures& s = results[1];
