@@ -31,7 +31,8 @@ int64_t nowMs() {
 
 }  // namespace
 
-int PollWaitPolicy::wait_for_multiple(const int* handles, std::size_t count, int timeoutMs) {
+int PollWaitPolicy::wait_for_multiple(const int* handles, std::size_t count, int timeoutMs,
+                                      std::vector<int>* alsoReady) {
   if (count > kMaxHandles) fail(EINVAL);
   pollfd fds[kMaxHandles];
   for (std::size_t i = 0; i < count; ++i) fds[i] = pollfd{handles[i], POLLIN, 0};
@@ -47,12 +48,21 @@ int PollWaitPolicy::wait_for_multiple(const int* handles, std::size_t count, int
     if (remaining <= 0) return -1;
     left = static_cast<int>(remaining);
   }
+  // POLLNVAL (a handle closed under the wait) counts as ready: the task's
+  // own read then fails and takes its failure path.
+  int first = -1;
   for (std::size_t i = 0; i < count; ++i) {
-    // POLLNVAL (a handle closed under the wait) counts as ready: the task's
-    // own read then fails and takes its failure path.
-    if (fds[i].revents != 0) return static_cast<int>(i);
+    if (fds[i].revents != 0) {
+      first = static_cast<int>(i);
+      break;
+    }
   }
-  return -1;
+  if (alsoReady != nullptr && first >= 0) {
+    for (std::size_t i = count; i-- > static_cast<std::size_t>(first) + 1;) {
+      if (fds[i].revents != 0) alsoReady->push_back(static_cast<int>(i));
+    }
+  }
+  return first;
 }
 
 }  // namespace hsdig

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstddef>
+#include <vector>
 
 namespace hsdig {
 
@@ -15,7 +16,12 @@ struct PollWaitPolicy {
   // the wait writes the diagnostic line "SelectPolicy<TPipeServer>::
   // wait_for_multiple() " with the error and throws TTransportException
   // kind unknown.
-  static int wait_for_multiple(const int* handles, std::size_t count, int timeoutMs);
+  //
+  // With `alsoReady`, the indices of the other handles found ready in the
+  // same wait are appended to it, highest first, so that the caller can serve
+  // them without waiting again.
+  static int wait_for_multiple(const int* handles, std::size_t count, int timeoutMs,
+                               std::vector<int>* alsoReady = nullptr);
 };
 
 }  // namespace hsdig

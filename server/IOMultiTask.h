@@ -89,8 +89,11 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
     removeAt(static_cast<std::size_t>(lastIndex_));
   }
 
+  // Also forgets the readiness found by the last wait: its indices may no
+  // longer name the same tasks. A ready handle is found again by the next wait.
   void refreshHandles() {
     for (std::size_t k = 0; k < tasks_.size(); ++k) handles_[k] = tasks_[k]->getWaitHandle();
+    foundReady_.clear();
   }
 
   // Stops the loop and drops every task (the accept task and every
@@ -101,6 +104,7 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
     std::vector<std::shared_ptr<IOTask>> dropped;
     dropped.swap(tasks_);
     handles_.clear();
+    foundReady_.clear();
     dropped.clear();
   }
 
@@ -138,13 +142,7 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
         launchAnotherThread();
       }
 
-      int i = lastIndex_;
-      const bool ready = i >= 0 && static_cast<std::size_t>(i) < tasks_.size() &&
-                         tasks_[static_cast<std::size_t>(i)]->isReady();
-      if (!ready) {
-        i = THandleWaitPolicy::wait_for_multiple(handles_.data(), handles_.size(),
-                                                 waitTimeoutMs_.load());
-      }
+      const int i = nextReadyTask();
       if (i < 0) {
         if (waiting_.load() > 1) {
           pool_.retireThread(std::this_thread::get_id());
@@ -157,6 +155,29 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
       std::shared_ptr<IOTask> task = tasks_[static_cast<std::size_t>(i)];
       task->process(guard);
     }
+  }
+
+  // The task to serve next, waiting only when none has work already: first
+  // the task served last when it holds another whole frame, then the tasks
+  // the last wait found ready as well (one wait serves every connection it
+  // found ready, in turn), then any task with bytes already read, and only
+  // then a wait. -1 when the wait timed out.
+  int nextReadyTask() {
+    const int last = lastIndex_;
+    if (last >= 0 && static_cast<std::size_t>(last) < tasks_.size() &&
+        tasks_[static_cast<std::size_t>(last)]->isReady()) {
+      return last;
+    }
+    if (!foundReady_.empty()) {
+      const int next = foundReady_.back();
+      foundReady_.pop_back();
+      return next;
+    }
+    for (std::size_t k = 0; k < tasks_.size(); ++k) {
+      if (tasks_[k]->isReady()) return static_cast<int>(k);
+    }
+    return THandleWaitPolicy::wait_for_multiple(handles_.data(), handles_.size(),
+                                                waitTimeoutMs_.load(), &foundReady_);
   }
 
   void launchAnotherThread() {
@@ -176,6 +197,7 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
   }
 
   std::vector<int> handles_;                    // guarded by waitLock_
+  std::vector<int> foundReady_;                 // guarded by waitLock_
   std::vector<std::shared_ptr<IOTask>> tasks_;  // guarded by waitLock_
   std::mutex waitLock_;
   SingleTaskThreadPool& pool_;

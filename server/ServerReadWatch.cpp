@@ -51,12 +51,14 @@ ServerReadWatch::~ServerReadWatch() {
 }
 
 int ServerReadWatch::getWaitHandle() {
-  return connection_->isOpen() ? connection_->getNativeWaitHandle() : -1;
+  // The socket itself: polling it costs less than polling the pipe's own
+  // wait handle, and bytes already in the read-ahead count through isReady.
+  return connection_->isOpen() ? connection_->getPipeHandle() : -1;
 }
 
 bool ServerReadWatch::moreBytesWaiting() const {
   if (connection_->isBufferedDataAvailable()) return true;
-  pollfd probe{connection_->getNativeWaitHandle(), POLLIN, 0};
+  pollfd probe{connection_->getPipeHandle(), POLLIN, 0};
   return probe.fd >= 0 && platform::sys::poll(&probe, 1, 0) > 0;
 }
 

@@ -63,7 +63,9 @@ class ServerReadWatch : public IOTask, public std::enable_shared_from_this<Serve
 
   int getWaitHandle() override;
   void process(UniqueGuard& guard) override;
-  bool isReady() override { return nextFrameComplete_; }
+  // A whole frame waits in the frame buffer, or bytes wait in the pipe's
+  // read-ahead (which the socket's readiness does not show).
+  bool isReady() override { return nextFrameComplete_ || connection_->isBufferedDataAvailable(); }
 
   // The worker that holds this connection (set while it is being placed).
   void setWorker(MultiTask* multiTask, Controller* controller) {

@@ -69,6 +69,9 @@ class TPipe : public apache::thrift::transport::TVirtualTransport<TPipe> {
   // -1 when closed or for a client pipe.
   int getNativeWaitHandle() const { return impl_ ? impl_->getNativeWaitHandle() : -1; }
   bool isBufferedDataAvailable() const { return impl_ && impl_->isBufferedDataAvailable(); }
+  // The socket itself; -1 when closed. It polls readable only for bytes the
+  // kernel holds, not for those already in the read-ahead.
+  int getPipeHandle() const { return impl_ ? impl_->getPipeHandle() : -1; }
 
  private:
   std::shared_ptr<TPipeImpl> impl_;
