@@ -10,6 +10,7 @@
 
 #include <mutex>
 
+#include "server/LeaderHandOff.h"
 #include "server/TConcurrentServerContext.h"
 #include "server/UniqueGuard.h"
 
@@ -17,8 +18,11 @@ namespace hsdig {
 
 class ConcurrentProcessorEventHandler : public TConcurrentServerContext {
  public:
-  ConcurrentProcessorEventHandler(UniqueGuard& guard, std::mutex& connectionLock)
-      : guard_(guard), connectionLock_(connectionLock) {}
+  // `handOff` (optional) releases the worker lock for requestRead; without
+  // it the lock is simply unlocked.
+  ConcurrentProcessorEventHandler(UniqueGuard& guard, std::mutex& connectionLock,
+                                  LeaderHandOffInterface* handOff = nullptr)
+      : guard_(guard), connectionLock_(connectionLock), handOff_(handOff) {}
 
   void requestStarting() override {}
   void requestRead() override;
@@ -33,6 +37,7 @@ class ConcurrentProcessorEventHandler : public TConcurrentServerContext {
  private:
   UniqueGuard& guard_;
   std::mutex& connectionLock_;
+  LeaderHandOffInterface* handOff_;
   bool released_ = false;
   bool keep_ = false;
 };

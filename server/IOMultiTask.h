@@ -1,21 +1,33 @@
 // One worker's leader/follower loop over up to 64 tasks.
 //
-// Every thread of the worker's pool runs run(). The wait lock makes one of
-// them the leader: it waits on the task handles, and serves the task that
+// Every thread of the worker's pool runs run(). The thread that holds the
+// wait lock leads: it waits on the task handles and serves the task that
 // became ready with the lock held. A task that starts a request hands the
-// lock back (through the dispatcher's server context), so the next thread
-// leads while the request runs. The pool grows by one thread whenever a new
-// leader finds nobody waiting behind it, and a leader whose wait times out
-// retires while two or more other threads wait.
+// lead off (handOff, through the dispatcher's server context) before the
+// handler runs, so the worker's other connections are served meanwhile.
+//
+// The other threads follow: they wait on the worker's standby timer, not on
+// the lock. A hand-off releases the lock and makes sure the timer will expire
+// within kStandbyDelayUs; the serving thread takes the lead back when its
+// request is done, and a follower leads only when the timer finds the lock
+// free. A short request thus costs no thread wake-up at all, a long one
+// delays the worker's other connections by at most the standby delay, and a
+// busy worker wakes a follower at most once per delay. Whatever leaves the
+// lock without coming back for it (a retiring or failing thread) wakes a
+// follower at once.
+//
+// The pool grows by one thread whenever a new leader finds no follower, and a
+// leader whose wait times out retires while two or more followers wait.
 //
 // The task list and handle array change only under the wait lock: directly
 // in the accept and read-failure paths, otherwise through jobs that the
-// worker's IOTaskController runs (task 0). `waiting_` is atomic and read
-// without the lock for the grow and retire decisions.
+// worker's IOTaskController runs (task 0). `waiting_` (the followers) is
+// atomic and read without the lock for the grow and retire decisions.
 #pragma once
 
 #include <atomic>
 #include <cstdint>
+#include <system_error>
 #include <memory>
 #include <mutex>
 #include <thread>
@@ -25,23 +37,38 @@
 #include <thrift/Thrift.h>
 
 #include "platform/Diagnostic.h"
+#include "platform/EventFd.h"
+#include "platform/TimerFd.h"
 #include "server/IOTask.h"
+#include "server/LeaderHandOff.h"
 #include "server/SingleTaskThreadPool.h"
 #include "server/UniqueGuard.h"
 
 namespace hsdig {
 
 template <class THandleWaitPolicy>
-class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitPolicy>> {
+class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitPolicy>>,
+                    public LeaderHandOffInterface {
  public:
   static constexpr int kDefaultWaitTimeoutMs = 600000;
+  // How long a request may run before a follower takes the lead.
+  static constexpr int64_t kStandbyDelayUs = 1000;
   // The pool grows only up to this many threads. Calls on one served session
   // are serialized by the driver's session lock anyway, so more threads
   // would only wait there; without a ceiling a busy worker would grow a
   // thread for nearly every connection it holds.
   static constexpr std::size_t kMaxThreads = 4;
 
-  explicit IOMultiTask(SingleTaskThreadPool& pool) : pool_(pool) {}
+  // Throws std::system_error when the standby timer or the stop event
+  // cannot be created.
+  explicit IOMultiTask(SingleTaskThreadPool& pool) : pool_(pool) {
+    if (int error = standby_.create()) {
+      throw std::system_error(error, std::generic_category(), "timerfd");
+    }
+    if (int error = stopEvent_.create()) {
+      throw std::system_error(error, std::generic_category(), "eventfd");
+    }
+  }
   IOMultiTask(const IOMultiTask&) = delete;
   IOMultiTask& operator=(const IOMultiTask&) = delete;
 
@@ -53,7 +80,17 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
       loop();
     } catch (const std::exception& e) {
       platform::reportLine((std::string("IOMultiTask::run thread ends: ") + e.what()).c_str());
+      wakeAFollower();
     }
+  }
+
+  // Called with the wait lock held. The standby timer is armed unless it
+  // already is: a timer armed by an earlier hand-off expires no later than
+  // this one would, so a request never goes unwatched for longer than the
+  // standby delay, and a busy worker arms it at most once per delay.
+  void handOff(UniqueGuard& guard) override {
+    if (!standbyArmed_.exchange(true)) standby_.arm(kStandbyDelayUs);
+    if (guard.owns_lock()) guard.unlock();
   }
 
   // Appends `task` with a placeholder handle, then refreshes the handles.
@@ -101,6 +138,7 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
   // cleared, so a task's destructor never sees a half-cleared worker.
   void shutdown(UniqueGuard&) {
     stopped_.store(true);
+    stopEvent_.set();
     std::vector<std::shared_ptr<IOTask>> dropped;
     dropped.swap(tasks_);
     handles_.clear();
@@ -132,19 +170,19 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
   void loop() {
     for (;;) {
       if (stopped_.load()) return;
-      waiting_.fetch_add(1);
-      UniqueGuard guard(waitLock_);
-      if (stopped_.load()) {
-        waiting_.fetch_sub(1);
-        return;
+      UniqueGuard guard(waitLock_, std::try_to_lock);
+      if (!guard.owns_lock()) {
+        if (!follow()) return;
+        continue;
       }
-      if (waiting_.fetch_sub(1) - 1 < 1 && pool_.activeCount() < kMaxThreads) {
-        launchAnotherThread();
-      }
+      if (stopped_.load()) return;
+      if (waiting_.load() < 1 && pool_.activeCount() < kMaxThreads) launchAnotherThread();
 
       const int i = nextReadyTask();
       if (i < 0) {
         if (waiting_.load() > 1) {
+          guard.unlock();
+          wakeAFollower();
           pool_.retireThread(std::this_thread::get_id());
           return;
         }
@@ -155,6 +193,33 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
       std::shared_ptr<IOTask> task = tasks_[static_cast<std::size_t>(i)];
       task->process(guard);
     }
+  }
+
+  // Waits as a follower until the standby timer expires (a request outlasted
+  // the standby delay, or the leader left). False once the worker stops.
+  bool follow() {
+    waiting_.fetch_add(1);
+    const int handles[2] = {standby_.fd(), stopEvent_.fd()};
+    int ready = -1;
+    try {
+      while (ready < 0) ready = THandleWaitPolicy::wait_for_multiple(handles, 2, -1);
+    } catch (...) {
+      waiting_.fetch_sub(1);
+      throw;
+    }
+    waiting_.fetch_sub(1);
+    if (ready == 1 || stopped_.load()) return false;
+    standby_.consume();
+    // Cleared before the caller tries the lock: a hand-off that comes after
+    // a failed try arms the timer again.
+    standbyArmed_.store(false);
+    return true;
+  }
+
+  // Lets a follower take the lead now.
+  void wakeAFollower() {
+    standbyArmed_.store(true);
+    standby_.arm(1);
   }
 
   // The task to serve next, waiting only when none has work already: first
@@ -204,6 +269,9 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
   std::atomic<int> waitTimeoutMs_{kDefaultWaitTimeoutMs};
   std::atomic<int32_t> waiting_{0};
   std::atomic<bool> stopped_{false};
+  platform::TimerFd standby_;             // expires when a follower must lead
+  std::atomic<bool> standbyArmed_{false};
+  platform::EventFd stopEvent_;           // set once the worker stops
   int32_t lastIndex_ = 0;  // guarded by waitLock_
 };
 

@@ -139,7 +139,7 @@ void ServerReadWatch::process(UniqueGuard& guard) {
     if (guard.owns_lock()) guard.unlock();
     return;
   }
-  ConcurrentProcessorEventHandler serverContext(guard, connectionLock_);
+  ConcurrentProcessorEventHandler serverContext(guard, connectionLock_, multiTask_);
   try {
     if (!readFrame()) {
       if (guard.owns_lock()) guard.unlock();
