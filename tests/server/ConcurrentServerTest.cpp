@@ -4,6 +4,7 @@
 #include <poll.h>
 
 #include <map>
+#include <semaphore>
 #include <thread>
 #include <vector>
 
@@ -93,6 +94,60 @@ TEST_F(ConcurrentServer, SlowHandlerOnOneConnectionDoesNotDelayTheOthers) {
   for (int vi = 1; vi <= 20; ++vi) EXPECT_EQ(quick.reset(vi), vi);
   handler_->release.open();
   caller.join();
+}
+
+// A handler whose abort blocks until the test lets it go, any number of times.
+class RepeatedGateHandler : public hsdigEPNull {
+ public:
+  void abort(RetStatus& ret, int32_t vi) override {
+    entered.release();
+    released.acquire();
+    ret.code = vi;
+  }
+  void reset(RetStatus& ret, int32_t vi) override { ret.code = vi; }
+  std::counting_semaphore<> entered{0};
+  std::counting_semaphore<> released{0};
+};
+
+TEST_F(ConcurrentServer, EveryRequestThatOutlastsTheStandbyDelayGivesUpTheLead) {
+  auto handler = std::make_shared<RepeatedGateHandler>();
+  server_ = std::make_unique<Server>(pipeName_, handler);
+  Client slow(pipeName_), quick(pipeName_);
+  for (int round = 0; round < 200; ++round) {
+    std::thread caller([&] {
+      RetStatus ret;
+      slow.client->abort(ret, round);
+      EXPECT_EQ(ret.code, round);
+    });
+    handler->entered.acquire();
+    // Answered only once a follower has taken the lead from the blocked
+    // request; a hand-off that left no timer armed would hang here.
+    EXPECT_EQ(quick.reset(round), round);
+    handler->released.release();
+    caller.join();
+    // Short requests between the rounds: hand-offs that find the timer
+    // armed, expired or idle.
+    for (int k = 0; k < round % 4; ++k) EXPECT_EQ(quick.reset(k), k);
+  }
+}
+
+TEST_F(ConcurrentServer, ConnectionsReadyAtOnceAreAllServedWhileOthersLeave) {
+  start();
+  for (int round = 0; round < 10; ++round) {
+    std::vector<std::unique_ptr<Client>> clients;
+    for (int c = 0; c < 40; ++c) clients.push_back(std::make_unique<Client>(pipeName_));
+    // Every request is on its way before any is answered, so one wait finds
+    // many connections ready; every third client leaves at once, changing
+    // the task list while those found ready are being served.
+    for (int c = 0; c < 40; ++c) clients[c]->client->send_reset(round * 100 + c);
+    for (int c = 0; c < 40; c += 3) clients[c].reset();
+    for (int c = 0; c < 40; ++c) {
+      if (!clients[c]) continue;
+      RetStatus ret;
+      clients[c]->client->recv_reset(ret);
+      EXPECT_EQ(ret.code, round * 100 + c);
+    }
+  }
 }
 
 TEST_F(ConcurrentServer, SixtyThirdConnectionOpensASecondWorker) {
