@@ -309,48 +309,83 @@ long settledResidentKiB(const ServerProcess& process) {
 }
 
 // Calls per second, threads at 64 connections, big replies and memory.
-void measureLoad(const Target& target, ServerProcess& process, bool quick, Figures& f) {
+// Calls per second at 1, 8 and 64 connections, each server in turn for a
+// share of the calls per round, and the server threads at 64 connections.
+void measureCallRates(const std::vector<const Target*>& targets,
+                      std::vector<ServerProcess>& processes, std::vector<Figures>& out,
+                      bool quick) {
+  const int rounds = 5;
   for (int k = 0; k < 3; ++k) {
     const int connections = kConnections[k];
-    const int perConnection = (quick ? 20000 : 100000) / connections;
-    std::vector<std::unique_ptr<Caller>> callers;
-    for (int c = 0; c < connections; ++c) callers.push_back(target.connect());
-    for (auto& caller : callers) caller->call();
-    std::atomic<int> started{0};
-    std::vector<std::thread> threads;
-    auto start = Clock::now();
-    for (auto& caller : callers) {
-      threads.emplace_back([&, c = caller.get()] {
-        ++started;
-        for (int i = 0; i < perConnection; ++i) c->call();
-      });
+    const int perRound = (quick ? 20000 : 100000) / connections / rounds;
+    std::vector<std::vector<std::unique_ptr<Caller>>> callers(targets.size());
+    for (size_t t = 0; t < targets.size(); ++t) {
+      for (int c = 0; c < connections; ++c) callers[t].push_back(targets[t]->connect());
+      for (auto& caller : callers[t]) caller->call();
     }
-    if (connections == 64) {
-      while (started.load() < 64) std::this_thread::yield();
-      f.threadsAt64 = process.threads();
-    }
-    for (auto& t : threads) t.join();
-    f.callsPerSecond[k] = connections * perConnection / secondsSince(start);
-  }
-  if (target.hasBigReplies) {
-    auto caller = target.connect();
-    struct Size {
-      int32_t bytes;
-      int repeats;
-      double* out;
-    };
-    const Size sizes[] = {{16 << 20, quick ? 3 : 10, &f.mibPerSecond16},
-                          {128 << 20, quick ? 1 : 3, &f.mibPerSecond128}};
-    for (const auto& s : sizes) {
-      auto start = Clock::now();
-      for (int i = 0; i < s.repeats; ++i) {
-        if (caller->bigReply(s.bytes) != static_cast<size_t>(s.bytes)) std::abort();
+    std::vector<double> seconds(targets.size(), 0.0);
+    for (int round = 0; round < rounds; ++round) {
+      for (size_t t = 0; t < targets.size(); ++t) {
+        std::atomic<int> started{0};
+        std::vector<std::thread> threads;
+        auto start = Clock::now();
+        for (auto& caller : callers[t]) {
+          threads.emplace_back([&, c = caller.get()] {
+            ++started;
+            for (int i = 0; i < perRound; ++i) c->call();
+          });
+        }
+        if (connections == 64 && round == 0) {
+          while (started.load() < 64) std::this_thread::yield();
+          out[t].threadsAt64 = processes[t].threads();
+        }
+        for (auto& thread : threads) thread.join();
+        seconds[t] += secondsSince(start);
       }
-      *s.out = double(s.bytes) * s.repeats / (1 << 20) / secondsSince(start);
     }
-    f.peakMiB = process.peakKiB() / 1024;
-    caller->call();  // one small call after the big replies
-    f.residentAfterMiB = settledResidentKiB(process) / 1024;
+    for (size_t t = 0; t < targets.size(); ++t) {
+      out[t].callsPerSecond[k] = double(connections) * perRound * rounds / seconds[t];
+    }
+  }
+}
+
+// Throughput of 16 and 128 MiB replies, the servers taking turns, then each
+// server's peak memory and its resident memory once the replies are done.
+void measureBigReplies(const std::vector<const Target*>& targets,
+                       std::vector<ServerProcess>& processes, std::vector<Figures>& out,
+                       bool quick) {
+  struct Size {
+    int32_t bytes;
+    int rounds;
+    double Figures::*mibPerSecond;
+  };
+  const Size sizes[] = {{16 << 20, quick ? 3 : 10, &Figures::mibPerSecond16},
+                        {128 << 20, quick ? 2 : 5, &Figures::mibPerSecond128}};
+  std::vector<std::unique_ptr<Caller>> callers(targets.size());
+  for (size_t t = 0; t < targets.size(); ++t) {
+    if (targets[t]->hasBigReplies) callers[t] = targets[t]->connect();
+  }
+  for (const auto& size : sizes) {
+    std::vector<double> seconds(targets.size(), 0.0);
+    for (int round = 0; round < size.rounds; ++round) {
+      for (size_t t = 0; t < targets.size(); ++t) {
+        if (!callers[t]) continue;
+        auto start = Clock::now();
+        if (callers[t]->bigReply(size.bytes) != static_cast<size_t>(size.bytes)) std::abort();
+        seconds[t] += secondsSince(start);
+      }
+    }
+    for (size_t t = 0; t < targets.size(); ++t) {
+      if (callers[t]) {
+        out[t].*size.mibPerSecond = double(size.bytes) * size.rounds / (1 << 20) / seconds[t];
+      }
+    }
+  }
+  for (size_t t = 0; t < targets.size(); ++t) {
+    if (!callers[t]) continue;
+    out[t].peakMiB = processes[t].peakKiB() / 1024;
+    callers[t]->call();  // one small call after the big replies
+    out[t].residentAfterMiB = settledResidentKiB(processes[t]) / 1024;
   }
 }
 
@@ -438,9 +473,12 @@ int main(int argc, char** argv) {
     chosenTargets.push_back(targets[t]);
   }
   std::vector<Figures> figures(chosen.size());
+  // Every server runs for the whole measurement, and each phase gives them
+  // turns, so a drift of the machine weighs on all of them alike.
   measureRoundTrips(chosenTargets, figures, quick);
+  measureCallRates(chosenTargets, processes, figures, quick);
+  measureBigReplies(chosenTargets, processes, figures, quick);
   for (size_t c = 0; c < chosen.size(); ++c) {
-    measureLoad(*chosenTargets[c], processes[c], quick, figures[c]);
     processes[c].finish();
     results[chosen[c]] = figures[c];
     printRow(chosenTargets[c]->name, figures[c], chosenTargets[c]->hasBigReplies);
