@@ -27,9 +27,9 @@
 
 #include <atomic>
 #include <cstdint>
-#include <system_error>
 #include <memory>
 #include <mutex>
+#include <system_error>
 #include <thread>
 #include <typeinfo>
 #include <vector>
@@ -269,10 +269,10 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
   std::atomic<int> waitTimeoutMs_{kDefaultWaitTimeoutMs};
   std::atomic<int32_t> waiting_{0};
   std::atomic<bool> stopped_{false};
-  platform::TimerFd standby_;             // expires when a follower must lead
+  platform::TimerFd standby_;  // expires when a follower must lead
   std::atomic<bool> standbyArmed_{false};
-  platform::EventFd stopEvent_;           // set once the worker stops
-  int32_t lastIndex_ = 0;  // guarded by waitLock_
+  platform::EventFd stopEvent_;  // set once the worker stops
+  int32_t lastIndex_ = 0;        // guarded by waitLock_
 };
 
 }  // namespace hsdig

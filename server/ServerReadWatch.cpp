@@ -148,8 +148,10 @@ void ServerReadWatch::process(UniqueGuard& guard) {
     if (eventHandler_) eventHandler_->processContext(connectionContext_, connection_);
     const uint64_t requestBytes = uint64_t{4} + frameSize_;
     if (processor_->process(inputProtocol_, outputProtocol_, &serverContext, connectionContext_)) {
-      const uint64_t replyBytes = replyTransport_ ? replyTransport_->takeLastFlushedFrameBytes() : 0;
-      if (std::max(requestBytes, replyBytes) >= kTrimAfterFrameBytes) giveBackMemoryAfterLargeFrames();
+      const uint64_t replyBytes =
+          replyTransport_ ? replyTransport_->takeLastFlushedFrameBytes() : 0;
+      if (std::max(requestBytes, replyBytes) >= kTrimAfterFrameBytes)
+        giveBackMemoryAfterLargeFrames();
       return;
     }
     platform::reportLine("ServerReadWatch: Stream header is corrupt.");

@@ -44,7 +44,8 @@ void await(int fd, short events, int32_t timeoutMs, const char* blockingDiagnost
 
 uint32_t receive(int fd, uint8_t* buffer, uint32_t length, int32_t timeoutMs,
                  const ReadTexts& texts, bool waitFirst) {
-  if (waitFirst) await(fd, POLLIN, timeoutMs, texts.blockingWaitDiagnostic, texts.blockingWaitFailed);
+  if (waitFirst)
+    await(fd, POLLIN, timeoutMs, texts.blockingWaitDiagnostic, texts.blockingWaitFailed);
   for (;;) {
     const ssize_t got = platform::sys::recv(fd, buffer, length, 0);
     if (got >= 0) return static_cast<uint32_t>(got);

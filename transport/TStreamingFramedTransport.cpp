@@ -94,7 +94,8 @@ uint32_t TStreamingFramedTransport::readSlow(uint8_t* buf, uint32_t len) {
   if (readPos_ == readEnd_) {
     if (len >= kDirectSize) {
       const uint32_t got = transport_->read(buf, std::min(len, frameLeft_));
-      if (got == 0) throw TTransportException(TTransportException::END_OF_FILE, "No more data to read.");
+      if (got == 0)
+        throw TTransportException(TTransportException::END_OF_FILE, "No more data to read.");
       frameLeft_ -= got;
       return got;
     }
@@ -152,7 +153,9 @@ void TStreamingFramedTransport::resetWrite() {
   wBase_ = wBuf_.get() + kHeaderSize;
 }
 
-void TStreamingFramedTransport::discardWrite() { resetWrite(); }
+void TStreamingFramedTransport::discardWrite() {
+  resetWrite();
+}
 
 void TStreamingFramedTransport::flush() {
   if (pieces_.empty()) {

@@ -86,12 +86,12 @@ class TStreamingFramedTransport : public apache::thrift::transport::TFramedTrans
 
   const bool directWrites_;
   std::unique_ptr<uint8_t[]> readAhead_;
-  uint32_t readPos_ = 0;      // read-ahead bytes before this are in the window or consumed
-  uint32_t readEnd_ = 0;      // read-ahead bytes up to here are valid
-  uint32_t frameLeft_ = 0;    // payload bytes of the current frame not yet in the window
-  uint64_t frameBytes_ = 0;   // the current frame's payload size
+  uint32_t readPos_ = 0;     // read-ahead bytes before this are in the window or consumed
+  uint32_t readEnd_ = 0;     // read-ahead bytes up to here are valid
+  uint32_t frameLeft_ = 0;   // payload bytes of the current frame not yet in the window
+  uint64_t frameBytes_ = 0;  // the current frame's payload size
   std::vector<Piece> pieces_;
-  uint32_t pieceStart_ = 0;   // offset in the write buffer where the open run starts
+  uint32_t pieceStart_ = 0;  // offset in the write buffer where the open run starts
   uint64_t externalBytes_ = 0;
   std::atomic<uint64_t> lastFlushedFrameBytes_{0};
 };

@@ -435,16 +435,15 @@ int main(int argc, char** argv) {
   auto config = hsdig::contract::makeTransportConfiguration();
 
   Target raw{"raw socket", [&] { return std::make_unique<RawCaller>(rawPath); }, false};
-  Target stock{"TThreadedServer",
-               [&] {
-                 auto socket =
-                     std::make_shared<apache::thrift::transport::TSocket>(stockPath, config);
-                 auto framed =
-                     std::make_shared<apache::thrift::transport::TFramedTransport>(socket, config);
-                 return std::make_unique<ThriftCaller>(
-                     framed, hsdig::contract::makeProtocolFactory()->getProtocol(framed));
-               },
-               true};
+  Target stock{
+      "TThreadedServer",
+      [&] {
+        auto socket = std::make_shared<apache::thrift::transport::TSocket>(stockPath, config);
+        auto framed = std::make_shared<apache::thrift::transport::TFramedTransport>(socket, config);
+        return std::make_unique<ThriftCaller>(
+            framed, hsdig::contract::makeProtocolFactory()->getProtocol(framed));
+      },
+      true};
   Target ours{"hsdig Server",
               [&] {
                 auto pipe = std::make_shared<hsdig::transport::TPipe>(ourName);

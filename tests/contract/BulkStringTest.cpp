@@ -15,8 +15,8 @@ namespace hsdig::contract {
 namespace {
 
 TEST(BulkStringTest, ReadsSmallLargeAndReusedStringsAsWritten) {
-  auto buffer = std::make_shared<apache::thrift::transport::TMemoryBuffer>(
-      makeTransportConfiguration());
+  auto buffer =
+      std::make_shared<apache::thrift::transport::TMemoryBuffer>(makeTransportConfiguration());
   auto writer = makeProtocolFactory()->getProtocol(buffer);
   std::string large(TBulkStringBinaryProtocol::kBulkStringSize + 12345, '\0');
   for (size_t i = 0; i < large.size(); ++i) large[i] = static_cast<char>(i * 31 % 253);
@@ -45,8 +45,8 @@ TEST(BulkStringTest, ReadsSmallLargeAndReusedStringsAsWritten) {
 }
 
 TEST(BulkStringTest, ALengthPastTheDataFailsWithoutKeepingAPartialString) {
-  auto buffer = std::make_shared<apache::thrift::transport::TMemoryBuffer>(
-      makeTransportConfiguration());
+  auto buffer =
+      std::make_shared<apache::thrift::transport::TMemoryBuffer>(makeTransportConfiguration());
   auto writer = makeProtocolFactory()->getProtocol(buffer);
   writer->writeI32(TBulkStringBinaryProtocol::kBulkStringSize);
   writer->writeI32(7);  // far fewer bytes than announced

@@ -134,8 +134,7 @@ TEST(StreamingFramedTest, WritesTheLibrarysBytesWithAndWithoutDirectWrites) {
 TEST(StreamingFramedTest, DirectWritesSendTheCallersBytesAndCanBeDiscarded) {
   auto sink = std::make_shared<Trickle>();
   auto framed = std::make_shared<TStreamingFramedTransport>(
-      sink, contract::makeTransportConfiguration(),
-      TStreamingFramedTransport::DirectWrites::kOn);
+      sink, contract::makeTransportConfiguration(), TStreamingFramedTransport::DirectWrites::kOn);
   // A large write is referenced, not copied: a change before the flush is
   // what goes out.
   std::string big(TStreamingFramedTransport::kDirectSize, 'x');
@@ -168,8 +167,8 @@ TEST(StreamingFramedTest, ReadsEveryMessageWhateverPiecesTheStreamArrivesIn) {
   for (uint32_t chunk : {1u, 3u, 4u, 5u, 1000u, 16384u, 70000u, 1u << 30}) {
     SCOPED_TRACE("chunk " + std::to_string(chunk));
     auto source = std::make_shared<Trickle>(stream, chunk);
-    auto framed = std::make_shared<TStreamingFramedTransport>(
-        source, contract::makeTransportConfiguration());
+    auto framed =
+        std::make_shared<TStreamingFramedTransport>(source, contract::makeTransportConfiguration());
     TBinaryProtocol in(framed);
     for (size_t i = 0; i < bigs.size(); ++i) {
       std::string big;
@@ -217,7 +216,10 @@ TEST(StreamingFramedTest, RefusesBadFramesWithTheLibrarysTexts) {
        "Received an oversized frame"},
       {std::string("\0\0", 2), TTransportException::END_OF_FILE,
        "No more data to read after partial frame header."},
-      {std::string("\0\0\0\x08" "ab", 6), TTransportException::END_OF_FILE, "No more data to read."},
+      {std::string("\0\0\0\x08"
+                   "ab",
+                   6),
+       TTransportException::END_OF_FILE, "No more data to read."},
   };
   for (const auto& c : cases) {
     SCOPED_TRACE(c.text);
