@@ -74,7 +74,9 @@ struct ServerProcess {
     }
     return -1;
   }
-  long threads() const { return statusField("Threads:"); }
+  // The threads serving: all of the process's but its main thread, which
+  // only waits for the end of the benchmark.
+  long serverThreads() const { return statusField("Threads:") - 1; }
   long peakKiB() const { return statusField("VmHWM:"); }
   long residentKiB() const { return statusField("VmRSS:"); }
   void finish() {
@@ -337,7 +339,7 @@ void measureCallRates(const std::vector<const Target*>& targets,
         }
         if (connections == 64 && round == 0) {
           while (started.load() < 64) std::this_thread::yield();
-          out[t].threadsAt64 = processes[t].threads();
+          out[t].threadsAt64 = processes[t].serverThreads();
         }
         for (auto& thread : threads) thread.join();
         seconds[t] += secondsSince(start);
