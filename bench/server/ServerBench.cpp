@@ -422,12 +422,14 @@ int main(int argc, char** argv) {
         return 2;
       }
     } else {
-      std::fprintf(stderr,
+      const bool help = std::strcmp(argv[a], "--help") == 0;
+      if (!help) std::fprintf(stderr, "bench_server: unknown argument '%s'\n", argv[a]);
+      std::fprintf(help ? stdout : stderr,
                    "usage: bench_server [--quick] [--only raw|stock|ours]\n"
                    "  Prints round trips, calls per second, server threads, reply\n"
                    "  throughput and server memory, then the ratios of our server.\n"
                    "  --only measures one server and prints its row alone (for profiling).\n");
-      return std::strcmp(argv[a], "--help") == 0 ? 0 : 2;
+      return help ? 0 : 2;
     }
   }
   const std::string tag = std::to_string(::getpid());
