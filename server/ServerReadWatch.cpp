@@ -12,6 +12,7 @@
 #include "platform/Diagnostic.h"
 #include "platform/Syscalls.h"
 #include "server/ConcurrentProcessorEventHandler.h"
+#include "transport/FrameLength.h"
 
 namespace hsdig {
 
@@ -101,7 +102,7 @@ bool ServerReadWatch::readFrame() {
       if (bytesBuffered_ < 4) return false;
     }
     const uint8_t* p = frameBuffer_.data();
-    frameSize_ = (uint32_t{p[0]} << 24) | (uint32_t{p[1]} << 16) | (uint32_t{p[2]} << 8) | p[3];
+    frameSize_ = transport::decodeFrameLength(p);
     if (uint64_t{4} + frameSize_ > frameBuffer_.size()) {
       if (frameSize_ > maxFrameSize_) {
         platform::reportLine("Giant frame requested.");
@@ -121,8 +122,7 @@ bool ServerReadWatch::readFrame() {
   const uint64_t afterFrame = uint64_t{4} + frameSize_;
   if (afterFrame + 4 < bytesBuffered_) {
     const uint8_t* n = frameBuffer_.data() + afterFrame;
-    const uint64_t nextSize =
-        (uint64_t{n[0]} << 24) | (uint64_t{n[1]} << 16) | (uint64_t{n[2]} << 8) | n[3];
+    const uint64_t nextSize = transport::decodeFrameLength(n);
     nextFrameComplete_ = afterFrame + 4 + nextSize <= bytesBuffered_;
   }
   inputBuffer_->resetBuffer(frameBuffer_.data() + 4, frameSize_,

@@ -6,20 +6,15 @@
 
 #include <thrift/transport/TTransportException.h>
 
+#include "transport/FrameLength.h"
+
 namespace hsdig::transport {
 
 using apache::thrift::transport::TTransportException;
 
 namespace {
 
-constexpr uint32_t kHeaderSize = 4;
-
-void putBigEndian32(uint8_t* out, uint32_t value) {
-  out[0] = static_cast<uint8_t>(value >> 24);
-  out[1] = static_cast<uint8_t>(value >> 16);
-  out[2] = static_cast<uint8_t>(value >> 8);
-  out[3] = static_cast<uint8_t>(value);
-}
+constexpr uint32_t kHeaderSize = kFrameLengthSize;
 
 }  // namespace
 
@@ -35,34 +30,27 @@ TStreamingFramedTransport::TStreamingFramedTransport(
 // ---------------------------------------------------------------------------
 // Reading
 
-void TStreamingFramedTransport::fillReadAhead(const char* endOfStreamText) {
+bool TStreamingFramedTransport::fillReadAhead() {
   readPos_ = readEnd_ = 0;
-  const uint32_t got = transport_->read(readAhead_.get(), kReadAheadSize);
-  if (got == 0) throw TTransportException(TTransportException::END_OF_FILE, endOfStreamText);
-  readEnd_ = got;
+  readEnd_ = transport_->read(readAhead_.get(), kReadAheadSize);
+  return readEnd_ > 0;
 }
 
 bool TStreamingFramedTransport::beginFrame() {
   uint8_t header[kHeaderSize];
   uint32_t got = 0;
   while (got < kHeaderSize) {
-    if (readPos_ == readEnd_) {
-      if (got == 0) {
-        readPos_ = readEnd_ = 0;
-        const uint32_t n = transport_->read(readAhead_.get(), kReadAheadSize);
-        if (n == 0) return false;
-        readEnd_ = n;
-      } else {
-        fillReadAhead("No more data to read after partial frame header.");
-      }
+    if (readPos_ == readEnd_ && !fillReadAhead()) {
+      if (got == 0) return false;
+      throw TTransportException(TTransportException::END_OF_FILE,
+                                "No more data to read after partial frame header.");
     }
     const uint32_t take = std::min(kHeaderSize - got, readEnd_ - readPos_);
     std::memcpy(header + got, readAhead_.get() + readPos_, take);
     readPos_ += take;
     got += take;
   }
-  const auto size = static_cast<int32_t>((uint32_t{header[0]} << 24) | (uint32_t{header[1]} << 16) |
-                                         (uint32_t{header[2]} << 8) | header[3]);
+  const auto size = static_cast<int32_t>(decodeFrameLength(header));
   if (size < 0) throw TTransportException("Frame size has negative value");
   if (size > static_cast<int64_t>(maxFrameSize_)) {
     throw TTransportException(TTransportException::CORRUPTED_DATA, "Received an oversized frame");
@@ -99,7 +87,9 @@ uint32_t TStreamingFramedTransport::readSlow(uint8_t* buf, uint32_t len) {
       frameLeft_ -= got;
       return got;
     }
-    fillReadAhead("No more data to read.");
+    if (!fillReadAhead()) {
+      throw TTransportException(TTransportException::END_OF_FILE, "No more data to read.");
+    }
   }
   openWindow();
   const uint32_t give = std::min(len, static_cast<uint32_t>(rBound_ - rBase_));
@@ -170,7 +160,7 @@ void TStreamingFramedTransport::flush() {
     throw TTransportException(TTransportException::BAD_ARGS,
                               "Attempted to write over 2 GB to TFramedTransport.");
   }
-  putBigEndian32(wBuf_.get(), static_cast<uint32_t>(payload));
+  encodeFrameLength(wBuf_.get(), static_cast<uint32_t>(payload));
   // The state is reset before the writes, as the library's flush does, so a
   // failed write leaves a clean transport; the buffered bytes stay in place
   // until the next write.

@@ -76,9 +76,8 @@ class TStreamingFramedTransport : public apache::thrift::transport::TFramedTrans
   // Moves the read-ahead bytes that belong to the current frame into the
   // readable window.
   void openWindow();
-  // Reads at most kReadAheadSize bytes; throws END_OF_FILE at the end of the
-  // stream.
-  void fillReadAhead(const char* endOfStreamText);
+  // Reads at most kReadAheadSize bytes; false at the end of the stream.
+  bool fillReadAhead();
   uint32_t bufferedWriteBytes() const { return static_cast<uint32_t>(wBase_ - wBuf_.get()); }
   // Ends the run of buffered bytes that the next external piece follows.
   void closeBufferedPiece();
