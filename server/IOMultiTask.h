@@ -7,14 +7,14 @@
 // handler runs, so the worker's other connections are served meanwhile.
 //
 // The other threads follow: they wait on the worker's standby timer, not on
-// the lock. A hand-off releases the lock and makes sure the timer will expire
-// within kStandbyDelayUs; the serving thread takes the lead back when its
-// request is done, and a follower leads only when the timer finds the lock
-// free. A short request thus costs no thread wake-up at all, a long one
-// delays the worker's other connections by at most the standby delay, and a
-// busy worker wakes a follower at most once per delay. Whatever leaves the
-// lock without coming back for it (a retiring or failing thread) wakes a
-// follower at once.
+// the lock. A hand-off releases the lock and then makes sure the timer will
+// expire within kStandbyDelayUs; the serving thread takes the lead back when
+// its request is done, and a follower leads only when the timer expires and
+// finds the lock free. A short request thus costs no thread wake-up at all, a
+// long one delays the worker's other connections by at most the standby
+// delay, and a busy worker arms the timer at most once per delay. Whatever
+// leaves the lock without coming back for it (a retiring or failing thread)
+// wakes a follower at once.
 //
 // The pool grows by one thread whenever a new leader finds no follower, and a
 // leader whose wait times out retires while two or more followers wait.
@@ -84,13 +84,17 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
     }
   }
 
-  // Called with the wait lock held. The standby timer is armed unless it
-  // already is: a timer armed by an earlier hand-off expires no later than
-  // this one would, so a request never goes unwatched for longer than the
-  // standby delay, and a busy worker arms it at most once per delay.
+  // Called with the wait lock held. The lock is released first, and the
+  // standby timer armed afterwards unless it already is (a timer armed by an
+  // earlier hand-off expires no later than this one would, and arming a
+  // timer costs more than a small request). A follower clears the armed flag
+  // after it takes an expiry and only then tries the lock, so whenever a
+  // hand-off skips the arming, that follower's try comes after the release:
+  // it finds the lock free, or held by a thread that leads or hands off in
+  // turn.
   void handOff(UniqueGuard& guard) override {
-    if (!standbyArmed_.exchange(true)) standby_.arm(kStandbyDelayUs);
     if (guard.owns_lock()) guard.unlock();
+    if (!standbyArmed_.exchange(true)) standby_.arm(kStandbyDelayUs);
   }
 
   // Appends `task` with a placeholder handle, then refreshes the handles.
@@ -210,13 +214,11 @@ class IOMultiTask : public std::enable_shared_from_this<IOMultiTask<THandleWaitP
     waiting_.fetch_sub(1);
     if (ready == 1 || stopped_.load()) return false;
     standby_.consume();
-    // Cleared before the caller tries the lock: a hand-off that comes after
-    // a failed try arms the timer again.
     standbyArmed_.store(false);
     return true;
   }
 
-  // Lets a follower take the lead now.
+  // Lets a follower take the lead now; called after the lock is released.
   void wakeAFollower() {
     standbyArmed_.store(true);
     standby_.arm(1);
